@@ -1,0 +1,4 @@
+// The application object.
+#pragma once
+
+#include <Velmar/MacTypes.h>

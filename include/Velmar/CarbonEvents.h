@@ -1,0 +1,4 @@
+// Carbon event objects, parameters and the event queue.
+#pragma once
+
+#include <Velmar/MacTypes.h>

@@ -1,0 +1,4 @@
+// QuickDraw regions.
+#pragma once
+
+#include <Velmar/MacTypes.h>

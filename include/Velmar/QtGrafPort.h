@@ -1,0 +1,4 @@
+// Graphics ports and offscreen worlds.
+#pragma once
+
+#include <Velmar/MacTypes.h>

@@ -1,0 +1,4 @@
+// Conversions between Toolbox and Qt values, Pascal-string utilities.
+#pragma once
+
+#include <Velmar/MacTypes.h>

@@ -1,0 +1,19 @@
+// Everything a host needs: include this one header and link Velmar::Velmar.
+#pragma once
+
+#include <Velmar/MacTypes.h>
+#include <Velmar/MacErrors.h>
+#include <Velmar/Diagnostics.h>
+#include <Velmar/TextUtils.h>
+#include <Velmar/HostEncoding.h>
+#include <Velmar/HostCore.h>
+#include <Velmar/HostShell.h>
+#include <Velmar/Application.h>
+#include <Velmar/FeatureFlags.h>
+#include <Velmar/Events.h>
+#include <Velmar/CarbonEvents.h>
+#include <Velmar/CarbonEventHandlers.h>
+#include <Velmar/QtGrafPort.h>
+#include <Velmar/QuickDraw.h>
+#include <Velmar/QDRegions.h>
+#include <Velmar/QDShapes.h>
