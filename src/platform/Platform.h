@@ -1,0 +1,51 @@
+// The one place that talks to the operating system or the window system directly.
+// Windows virtual-key codes stay the library's key vocabulary on every platform.
+#pragma once
+
+#include <Velmar/MacTypes.h>
+
+#include <QString>
+
+class QEvent;
+class QImage;
+class QWidget;
+
+namespace Velmar::Private::Platform {
+
+// Keyboard, by Windows virtual-key code (VK_SHIFT 0x10, VK_CONTROL 0x11, VK_MENU 0x12 ...).
+bool isAsyncKeyDown(int virtualKey);
+bool isCapsLockToggled();
+// 256 entries: bit 0x80 set while the key is down, bit 0x01 for a toggled key.
+void getKeyboardState(UInt8 state[256]);
+
+// The system's left mouse button, asked of the window system where there is one.
+bool isSystemLeftButtonDown();
+
+// Feeds Qt's own key and mouse events to the fallback state used where the window system
+// cannot be asked (offscreen, Wayland). Cheap; called from the application's event filter.
+void trackInputEvent(const QEvent* event);
+
+// Writes one finished line to the debugger output channel (standard error off Windows).
+void debugOutput(const char* line);
+
+// True when native input is waiting that Qt has not yet seen. Always false off Windows.
+bool isNativeInputPending();
+
+// Native window handle of a top-level widget, and native z-order placement: put `window`
+// directly behind `behind` (null: to the front).
+void* nativeWindowHandle(QWidget* window);
+void placeNativeWindowBehind(QWidget* window, QWidget* behind);
+
+// An image for a window back buffer: DIB-backed on Windows, a plain QImage elsewhere.
+QImage createWindowImage(int width, int height);
+
+// Optional diagnostic libraries.
+QString executableDirectory();
+QString sharedLibraryFileName(const QString& baseName); // "X.dll", "libX.so"
+void* loadLibrary(const QString& path);
+void* resolveSymbol(void* library, const char* name);
+
+void debugBreak();
+bool isApplicationInForeground();
+
+} // namespace Velmar::Private::Platform
