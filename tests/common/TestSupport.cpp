@@ -2,18 +2,24 @@
 
 #include <Velmar/Diagnostics.h>
 
+#include "foundation/MessageHandler.h"
+
 #include <QSettings>
 
 namespace VelmarTest {
 
 LogCapture::LogCapture()
 {
+    // QtTest installs its own message handler while it runs; put the library's back so that
+    // every qDebug/qWarning of the code under test becomes a formatted line here.
+    m_previousHandler = Velmar::Private::installMessageHandler();
     Velmar::SetDebugOutputHook(&LogCapture::hook, this);
 }
 
 LogCapture::~LogCapture()
 {
     Velmar::SetDebugOutputHook(nullptr, nullptr);
+    qInstallMessageHandler(m_previousHandler);
 }
 
 void LogCapture::hook(const char* line, void* context)

@@ -23,6 +23,7 @@ public:
 private:
     static void hook(const char* line, void* context);
     QStringList m_lines;
+    QtMessageHandler m_previousHandler = nullptr;
 };
 
 // Points QSettings at a private temporary directory so tests never touch the user's

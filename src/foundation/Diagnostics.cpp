@@ -1,0 +1,62 @@
+// The classic debugger calls and the optional stack logger.
+#include <Velmar/Diagnostics.h>
+
+#include "foundation/DiagnosticsPrivate.h"
+#include "platform/Platform.h"
+
+#include <QDir>
+#include <QFileInfo>
+#include <QString>
+#include <QtGlobal>
+
+namespace Velmar {
+
+namespace {
+
+void* gStackLogTo = nullptr;
+
+QString pascalToQString(ConstStr255Param p)
+{
+    if (!p || p[0] == 0)
+        return QString();
+    return QString::fromLocal8Bit(reinterpret_cast<const char*>(p + 1), p[0]);
+}
+
+} // namespace
+
+void DebugStr(ConstStr255Param message)
+{
+    qDebug("%s", qPrintable(pascalToQString(message)));
+}
+
+void Debugger()
+{
+    Private::Platform::debugBreak();
+}
+
+void StartLoggingStackCalls()
+{
+    static bool sStarted = false;
+    if (sStarted)
+        return;
+    sStarted = true;
+
+    const QString path = QDir(Private::Platform::executableDirectory())
+                             .filePath(Private::Platform::sharedLibraryFileName(
+                                 QStringLiteral("StackLogger")));
+    if (!QFileInfo::exists(path))
+        return;
+    if (void* library = Private::Platform::loadLibrary(path))
+        gStackLogTo = Private::Platform::resolveSymbol(library, "StackLogTo");
+}
+
+namespace Private {
+
+void* stackLoggerEntry()
+{
+    return gStackLogTo;
+}
+
+} // namespace Private
+
+} // namespace Velmar

@@ -1,0 +1,96 @@
+// Categorised logging and the route every finished log line takes to the debugger output.
+#include <Velmar/Diagnostics.h>
+
+#include "foundation/DiagnosticsPrivate.h"
+#include "platform/Platform.h"
+
+#include <QtGlobal>
+
+#include <array>
+#include <cstdarg>
+#include <cstdio>
+
+namespace Velmar {
+
+namespace {
+
+struct CategoryName {
+    UInt32 bit;
+    const char* name;
+};
+
+constexpr std::array<CategoryName, 9> kCategoryNames{{
+    {kLogUnknown, "Unknown"},
+    {kLogWindowManagement, "WindowManagement"},
+    {kLogEvents, "Events"},
+    {kLogTextEdit, "TextEdit"},
+    {kLogQuickDraw, "QuickDraw"},
+    {kLogGrafPort, "GrafPort"},
+    {kLogNotImpl, "NotImpl"},
+    {kLogMenus, "Menus"},
+    {kLogActivation, "Activation"},
+}};
+
+// Messages longer than this (with the terminator) are cut.
+constexpr std::size_t kLogMessageBufferSize = 1024;
+
+UInt32 gEnabledLogCategories = 0;
+
+DebugOutputHook gDebugOutputHook = nullptr;
+void* gDebugOutputContext = nullptr;
+
+} // namespace
+
+bool LogCategoryEnabled(UInt32 category)
+{
+    return (gEnabledLogCategories & category) != 0;
+}
+
+void SetLogCategory(UInt32 category, bool on)
+{
+    if (on)
+        gEnabledLogCategories |= category;
+    else
+        gEnabledLogCategories &= ~category;
+}
+
+const char* LogCategoryName(UInt32 category)
+{
+    for (const CategoryName& c : kCategoryNames) {
+        if (c.bit == category)
+            return c.name;
+    }
+    return "N/A";
+}
+
+void VelmarLog(UInt32 category, const char* format, ...)
+{
+    if (!LogCategoryEnabled(category) || !format)
+        return;
+    char text[kLogMessageBufferSize];
+    va_list args;
+    va_start(args, format);
+    std::vsnprintf(text, sizeof text, format, args);
+    va_end(args);
+    qDebug("[%s] %s", LogCategoryName(category), text);
+}
+
+void SetDebugOutputHook(DebugOutputHook hook, void* context)
+{
+    gDebugOutputHook = hook;
+    gDebugOutputContext = hook ? context : nullptr;
+}
+
+namespace Private {
+
+void writeDebugOutput(const char* line)
+{
+    if (gDebugOutputHook)
+        gDebugOutputHook(line, gDebugOutputContext);
+    else
+        Platform::debugOutput(line);
+}
+
+} // namespace Private
+
+} // namespace Velmar
