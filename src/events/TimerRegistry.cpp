@@ -1,0 +1,89 @@
+#include "events/TimerRegistry.h"
+
+#include "events/EventQueue.h"
+#include "events/EventLoopTimer.h"
+
+#include <QCoreApplication>
+
+namespace Velmar::Private {
+
+namespace {
+
+// Qt timer events that arrived while dispatch was blocked were held back by the
+// application object; they go out again before the timers restart.
+void dispatchPostponedTimers()
+{
+}
+
+} // namespace
+
+// There is one queue, so one registry serves it.
+TimerRegistry& EventQueue::timerRegistry()
+{
+    static TimerRegistry sRegistry;
+    return sRegistry;
+}
+
+TimerRegistry& MainTimerRegistry()
+{
+    return gMainEventQueue.timerRegistry();
+}
+
+TimerRegistry::~TimerRegistry()
+{
+    // Timer objects can only be deleted while Qt's thread data is still around.
+    if (QCoreApplication::instance())
+        qDeleteAll(m_timers);
+}
+
+bool TimerRegistry::contains(const VelmarEventLoopTimer* timer) const
+{
+    return timer && m_timers.contains(timer);
+}
+
+void TimerRegistry::add(VelmarEventLoopTimer* timer)
+{
+    m_timers.append(timer);
+    if (!m_enabled)
+        timer->stop();
+}
+
+bool TimerRegistry::remove(VelmarEventLoopTimer* timer)
+{
+    if (!contains(timer))
+        return false;
+    m_timers.removeOne(timer);
+    if (timer->isFiring()) {
+        // Removed from inside its own procedure: delete once its timer event is done.
+        timer->stop();
+        timer->deleteLater();
+    } else {
+        delete timer;
+    }
+    return true;
+}
+
+void TimerRegistry::suspend()
+{
+    if (!m_enabled)
+        return;
+    m_enabled = false;
+    for (VelmarEventLoopTimer* timer : std::as_const(m_timers))
+        timer->stop();
+}
+
+void TimerRegistry::resume()
+{
+    if (m_enabled)
+        return;
+    dispatchPostponedTimers();
+    m_enabled = true;
+    // A procedure run from a re-posted timer event may install or remove timers: walk a copy.
+    const QList<VelmarEventLoopTimer*> timers = m_timers;
+    for (VelmarEventLoopTimer* timer : timers) {
+        if (m_timers.contains(timer))
+            timer->start();
+    }
+}
+
+} // namespace Velmar::Private
