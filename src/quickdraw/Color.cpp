@@ -1,0 +1,157 @@
+// The global hilite state, colour-model conversions, InvertColor and the colour dialog.
+#include <Velmar/HostEncoding.h>
+#include <Velmar/QuickDraw.h>
+
+#include "foundation/Conversions.h"
+#include "quickdraw/GrafPortPrivate.h"
+
+#include <QApplication>
+#include <QColorDialog>
+#include <QGuiApplication>
+#include <QPalette>
+
+namespace Velmar {
+
+namespace {
+
+struct HiliteState {
+    QColor color;
+    bool colorSet = false;
+    unsigned char mode = 0;
+};
+
+HiliteState& hilite()
+{
+    static HiliteState sHilite;
+    return sHilite;
+}
+
+QColor paletteHighlight()
+{
+    if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
+        return QGuiApplication::palette().color(QPalette::Active, QPalette::Highlight);
+    return QColor(0x30, 0x8c, 0xc6);
+}
+
+UInt16 scaledFraction(qreal fraction)
+{
+    // Truncated and cut to 16 bits: a grey's hue of -1 ends up as 1.
+    return static_cast<UInt16>(static_cast<int>(fraction * 65535.0));
+}
+
+} // namespace
+
+namespace Private {
+
+QColor globalHiliteColor()
+{
+    HiliteState& state = hilite();
+    if (!state.colorSet) {
+        state.color = paletteHighlight();
+        state.colorSet = true;
+    }
+    return state.color;
+}
+
+} // namespace Private
+
+void Initialize()
+{
+    static bool sDone = false;
+    if (sDone)
+        return;
+    sDone = true;
+    hilite().color = paletteHighlight();
+    hilite().colorSet = true;
+}
+
+void LMGetHiliteRGB(RGBColor* color)
+{
+    if (color)
+        *color = RGBColor(Private::globalHiliteColor());
+}
+
+void LMSetHiliteRGB(const RGBColor* color)
+{
+    if (!color)
+        return;
+    hilite().color = static_cast<QColor>(*color);
+    hilite().colorSet = true;
+}
+
+unsigned char LMGetHiliteMode()
+{
+    return hilite().mode;
+}
+
+void LMSetHiliteMode(unsigned char mode)
+{
+    hilite().mode = mode;
+}
+
+void HSV2RGB(const HSVColor* hsv, RGBColor* rgb)
+{
+    if (!hsv && !rgb)
+        return;
+    if (!hsv || !rgb)
+        return; // a caller error; nothing sensible to convert
+    const QColor c = QColor::fromHsvF(hsv->hue / 65535.0f, hsv->saturation / 65535.0f,
+                                      hsv->value / 65535.0f, 1.0f)
+                         .toRgb();
+    *rgb = RGBColor(c);
+}
+
+void RGB2HSV(const RGBColor* rgb, HSVColor* hsv)
+{
+    if (!rgb || !hsv)
+        return;
+    const QColor c = static_cast<QColor>(*rgb);
+    hsv->hue = scaledFraction(c.hueF());
+    hsv->saturation = scaledFraction(c.saturationF());
+    hsv->value = scaledFraction(c.valueF());
+}
+
+void RGB2HSL(const RGBColor* rgb, HSLColor* hsl)
+{
+    if (!rgb || !hsl)
+        return;
+    const QColor c = static_cast<QColor>(*rgb);
+    // Hue and saturation are the HSV ones here too, as the Toolbox callers expect.
+    hsl->hue = scaledFraction(c.hueF());
+    hsl->saturation = scaledFraction(c.saturationF());
+    hsl->lightness = scaledFraction(c.lightnessF());
+}
+
+void InvertColor(RGBColor* color)
+{
+    if (!color)
+        return;
+    color->red = static_cast<unsigned short>(~color->red);
+    color->green = static_cast<unsigned short>(~color->green);
+    color->blue = static_cast<unsigned short>(~color->blue);
+}
+
+unsigned char GetColor(Point /*where*/, const unsigned char* prompt, const RGBColor* inColor,
+                       RGBColor* outColor)
+{
+    if (!outColor)
+        return 0;
+    if (!qobject_cast<QApplication*>(QCoreApplication::instance()))
+        return 0;
+    QColorDialog dialog;
+    if (inColor)
+        dialog.setCurrentColor(static_cast<QColor>(*inColor));
+    if (prompt && prompt[0] > 0) {
+        unsigned short title[512];
+        const SInt32 units = CurrentMacMBCSEncodingToUTF16(
+            reinterpret_cast<const char*>(prompt + 1), prompt[0], title, 512);
+        dialog.setWindowTitle(QString::fromUtf16(reinterpret_cast<const char16_t*>(title),
+                                                 qMin<SInt32>(units, 511)));
+    }
+    if (dialog.exec() != QDialog::Accepted)
+        return 0;
+    *outColor = RGBColor(dialog.selectedColor());
+    return 1;
+}
+
+} // namespace Velmar

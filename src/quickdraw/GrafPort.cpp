@@ -1,0 +1,356 @@
+// The port object: creation, destruction, the lazily started painter, bounds and origin.
+#include <Velmar/Diagnostics.h>
+#include <Velmar/QtGrafPort.h>
+
+#include "quickdraw/GrafPortPrivate.h"
+
+#include <QImage>
+
+#include <algorithm>
+
+namespace Velmar {
+
+using namespace Private;
+
+namespace {
+
+// Ports with an active painter, oldest first.
+std::vector<QtGrafPort*>& activePorts()
+{
+    static std::vector<QtGrafPort*> sActive;
+    return sActive;
+}
+
+const QRect kWideOpenClip(-32767, -32767, 65534, 65534);
+
+} // namespace
+
+namespace Private {
+
+int activePainterCount()
+{
+    return static_cast<int>(activePorts().size());
+}
+
+bool isPainterListed(const QtGrafPort* port)
+{
+    const auto& list = activePorts();
+    return std::find(list.begin(), list.end(), port) != list.end();
+}
+
+} // namespace Private
+
+// ---- PainterState -----------------------------------------------------------------------
+
+PainterState::PainterState()
+    : pen(QBrush(Qt::black), 1.0, Qt::SolidLine, Qt::SquareCap, Qt::BevelJoin),
+      brush(Qt::black),
+      background(Qt::white)
+{
+}
+
+void PainterState::saveFrom(const QPainter& painter)
+{
+    pen = painter.pen();
+    font = painter.font();
+    brush = painter.brush();
+    background = painter.background();
+    compositionMode = painter.compositionMode();
+}
+
+void PainterState::applyTo(QPainter& painter) const
+{
+    painter.setPen(pen);
+    painter.setFont(font);
+    painter.setBrush(brush);
+    painter.setBackground(background);
+    painter.setCompositionMode(compositionMode);
+    // The clip is in local coordinates, so the transform goes first.
+    painter.setTransform(transform);
+    if (clipEnabled)
+        painter.setClipRegion(clip);
+    else
+        painter.setClipping(false);
+}
+
+// ---- Construction and destruction ---------------------------------------------------------
+
+QtGrafPort::QtGrafPort(const QRect& requested, SInt16 pixelDepth)
+{
+    QRect rect = requested;
+    if (rect.width() < 1)
+        rect.setWidth(1);
+    if (rect.height() < 1)
+        rect.setHeight(1);
+    allocateImage(rect.size());
+    init(rect, pixelDepth);
+}
+
+QtGrafPort::QtGrafPort(AQtWindow* owner, const QRect& widgetRect, QImage* backBuffer)
+    : window(owner), m_image(backBuffer)
+{
+    init(widgetRect, 6);
+}
+
+void QtGrafPort::init(const QRect& rect, SInt16 pixelDepth)
+{
+    hiliteColor = globalHiliteColor();
+    opColor = QColor(Qt::black);
+    backColor = QColor(Qt::white);
+    contentColor = QColor(Qt::white);
+    penX = rect.left();
+    penY = rect.top();
+    painter = new QPainter;
+    visibleRegion = QRegion(rect);
+    clipRegion = QRegion(kWideOpenClip);
+    bounds = rect;
+    pixmap = PixMapPtr::createPixMap(m_image.get(), this, pixelDepth ? pixelDepth : 6);
+    pixmap->clear();
+    registerPort(this);
+    applyOrigin();
+}
+
+QtGrafPort::~QtGrafPort()
+{
+    EndPaint();
+    if (gCurrentGrafPort == this) {
+        const PortWindowHooks& hooks = portWindowHooks();
+        QtGrafPort* next = hooks.frontVisiblePortExcept ? hooks.frontVisiblePortExcept(window)
+                                                        : nullptr;
+        gCurrentGrafPort = (next && next != this && isLivePort(next)) ? next : nullptr;
+    }
+    magic = kDeadMagic;
+    unregisterPort(this);
+    delete rgnSave;
+    rgnSave = nullptr;
+    delete painter;
+    painter = nullptr;
+    PixMapPtr::destroyPixMap(pixmap);
+    pixmap = nullptr;
+    m_image.reset();
+}
+
+bool QtGrafPort::allocateImage(const QSize& size)
+{
+    m_image.reset();
+    const qint64 pixels = qint64(size.width()) * size.height();
+    if (pixels > kMaxPortPixels) {
+        qWarning("QtGrafPort: a %dx%d image is too large; port %p keeps its bounds but has "
+                 "no pixels",
+                 size.width(), size.height(), static_cast<void*>(this));
+    } else {
+        auto image = std::make_unique<QImage>(size, QImage::Format_ARGB32_Premultiplied);
+        if (image->isNull())
+            qWarning("QtGrafPort: cannot allocate a %dx%d image for port %p", size.width(),
+                     size.height(), static_cast<void*>(this));
+        else
+            m_image = std::move(image);
+    }
+    if (pixmap)
+        pixmap->m_image = m_image.get();
+    return m_image != nullptr;
+}
+
+// ---- Painter ----------------------------------------------------------------------------
+
+void QtGrafPort::BeginPaint()
+{
+    if (!painter || m_painterActive) {
+        velmar_assert("this && m_painter && !isActive()", __FILE__, __LINE__, __func__,
+                      "BeginPaint on a port whose painter is missing or already active");
+        return;
+    }
+    QPaintDevice* target = paintDevice ? paintDevice : static_cast<QPaintDevice*>(m_image.get());
+    if (!target) {
+        VelmarLog(kLogGrafPort, "Outside of PaintEvent: BeginPaint");
+        return;
+    }
+    if (!paintDevice && !m_image->paintEngine())
+        VelmarLog(kLogGrafPort, "Something bad happens. paintEngine is NULL, qtPort=%p",
+                  static_cast<void*>(this));
+    if (!painter->begin(target))
+        return;
+    painterState.applyTo(*painter);
+    m_painterActive = true;
+
+    auto& active = activePorts();
+    active.push_back(this);
+    // Open painters hold native resources; keep at most kMaxActivePainters of them.
+    while (active.size() > std::size_t(kMaxActivePainters))
+        active.front()->EndPaint();
+}
+
+void QtGrafPort::EndPaint()
+{
+    if (m_painterActive) {
+        painterState.saveFrom(*painter);
+        painter->end();
+        m_painterActive = false;
+    }
+    auto& active = activePorts();
+    auto it = std::find(active.begin(), active.end(), this);
+    if (it != active.end())
+        active.erase(it);
+}
+
+// ---- State that lives in the painter while it is active ------------------------------------
+
+void QtGrafPort::setPen(const QPen& pen)
+{
+    if (m_painterActive)
+        painter->setPen(pen);
+    else
+        painterState.pen = pen;
+}
+
+void QtGrafPort::setForeColor(const QColor& color)
+{
+    if (m_painterActive) {
+        if (painter->pen().color() == color)
+            return;
+        QPen pen = painter->pen();
+        pen.setColor(color);
+        painter->setPen(pen);
+    } else {
+        painterState.pen.setColor(color);
+    }
+}
+
+void QtGrafPort::setBrush(const QBrush& brush)
+{
+    if (m_painterActive)
+        painter->setBrush(brush);
+    else
+        painterState.brush = brush;
+}
+
+void QtGrafPort::setBackground(const QBrush& brush)
+{
+    if (m_painterActive)
+        painter->setBackground(brush);
+    else
+        painterState.background = brush;
+}
+
+void QtGrafPort::setCompositionMode(QPainter::CompositionMode mode)
+{
+    if (m_painterActive)
+        painter->setCompositionMode(mode);
+    else
+        painterState.compositionMode = mode;
+}
+
+void QtGrafPort::setFont(const QFont& font)
+{
+    if (m_painterActive)
+        painter->setFont(font);
+    else
+        painterState.font = font;
+}
+
+// ---- Geometry and clip ----------------------------------------------------------------------
+
+void QtGrafPort::setBounds(const QRect& requested)
+{
+    if (m_image && m_image->size() == requested.size()) {
+        visibleRegion.translate(requested.topLeft() - bounds.topLeft());
+        bounds = requested;
+        applyOrigin();
+        return;
+    }
+    const bool wasActive = m_painterActive;
+    if (wasActive)
+        EndPaint();
+
+    QRect rect = requested;
+    if (rect.width() < 1) {
+        VelmarLog(kLogGrafPort, "Trying to SetBounds with negative width, port=%p",
+                  static_cast<void*>(this));
+        rect.setWidth(1);
+    }
+    if (rect.height() < 1) {
+        VelmarLog(kLogGrafPort, "Trying to SetBounds with negative height, port=%p",
+                  static_cast<void*>(this));
+        rect.setHeight(1);
+    }
+
+    if (window) {
+        // A window's buffer is repainted by the window: the old content is not kept.
+        if (m_image) {
+            const PortWindowHooks& hooks = portWindowHooks();
+            QImage* fresh = hooks.makeBackBuffer ? hooks.makeBackBuffer(window, rect.size())
+                                                 : nullptr;
+            if (fresh) {
+                m_image.reset(fresh);
+                pixmap->m_image = fresh;
+            } else {
+                allocateImage(rect.size());
+            }
+            pixmap->clear();
+        }
+    } else {
+        std::unique_ptr<QImage> old = std::move(m_image);
+        if (allocateImage(rect.size())) {
+            pixmap->clear();
+            if (old) {
+                QPainter copier(m_image.get());
+                copier.setCompositionMode(QPainter::CompositionMode_Source);
+                copier.drawImage(0, 0, *old);
+            }
+        }
+    }
+    // Drawing reaches the whole new area.
+    visibleRegion = QRegion(rect);
+
+    if (wasActive) {
+        BeginPaint();
+        if (!m_painterActive)
+            VelmarLog(kLogGrafPort, "Unable to start painter, grafPort: %p",
+                      static_cast<void*>(this));
+    }
+    bounds = rect;
+    applyOrigin();
+}
+
+void QtGrafPort::setOrigin(int h, int v)
+{
+    const QPoint delta = QPoint(h, v) - bounds.topLeft();
+    bounds.moveTopLeft(QPoint(h, v));
+    // The visible area is the same pixels, now under new local coordinates.
+    visibleRegion.translate(delta);
+    applyOrigin();
+}
+
+void QtGrafPort::applyOrigin()
+{
+    painterState.transform = QTransform::fromTranslate(-bounds.left(), -bounds.top());
+    if (m_painterActive)
+        painter->setTransform(painterState.transform);
+    updateEffectiveClip();
+}
+
+void QtGrafPort::updateEffectiveClip()
+{
+    QRegion effective = visibleRegion;
+    if (clipInForce)
+        effective &= clipRegion;
+    painterState.clip = effective;
+    // Clipping costs on every fill; skip it when the clip covers the whole port.
+    const bool coversPort = effective.rectCount() == 1 && effective.boundingRect().contains(bounds);
+    painterState.clipEnabled = !coversPort;
+    if (m_painterActive) {
+        if (painterState.clipEnabled)
+            painter->setClipRegion(effective);
+        else
+            painter->setClipping(false);
+    }
+}
+
+void QtGrafPort::markWindowDirty(const QRect& localRect)
+{
+    const PortWindowHooks& hooks = portWindowHooks();
+    if (hooks.markDirty)
+        hooks.markDirty(window, localRect.translated(-bounds.topLeft()));
+}
+
+} // namespace Velmar

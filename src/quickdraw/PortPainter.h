@@ -1,0 +1,52 @@
+// What drawing calls use: the painter of a port, the resolved fill and background brushes,
+// the pen-mode to composition-mode table, and the recording test.
+#pragma once
+
+#include <Velmar/QtGrafPort.h>
+#include <Velmar/QuickDraw.h>
+
+#include "quickdraw/GrafPortPrivate.h"
+
+namespace Velmar::Private {
+
+// The slow half of portPainter: logs, starts the painter, or gives null.
+QPainter* startPortPainter(QtGrafPort* port, const char* caller);
+
+// The port's active painter, started if need be; null (with a log line naming `caller`)
+// without a port, for a direct-drawing window outside its paint event, or when the
+// painter cannot start. A null port logs "warning: <caller>: Can't get current port!".
+inline QPainter* portPainter(QtGrafPort* port, const char* caller)
+{
+    if (port && port->isActive())
+        return port->painter;
+    return startPortPainter(port, caller);
+}
+
+// True while the port records MoveTo/LineTo or frame calls into a polygon or region:
+// drawing calls then record instead of drawing.
+inline bool isRecording(const QtGrafPort* port)
+{
+    return port && (port->definingPoly || port->definingRgn);
+}
+
+// The brush Paint and Fill operations use: the pen pattern in the foreground colour, on the
+// back colour (or transparent paper under patOr). The reference stays valid until the next
+// call for the same port.
+const QBrush& resolvedFillBrush(QtGrafPort* port);
+// The brush Erase operations and ScrollRect use: the background pattern in the back colour.
+const QBrush& resolvedBackgroundBrush(QtGrafPort* port);
+// A given pattern resolved like the fill brush (FillRect and friends).
+QBrush resolvedPatternBrush(QtGrafPort* port, const QBrush& pattern);
+
+// Recolours `brush` with ink and paper (the recolouring rules): solid black -> ink, solid
+// white -> paper, textures get ink on opaque or transparent paper. Cached process-wide.
+QBrush recolourBrush(const QBrush& brush, const QColor& ink, const QColor& paper,
+                     bool transparentPaper);
+
+// The composition mode a pen mode draws with.
+QPainter::CompositionMode compositionModeForPenMode(SInt16 mode);
+
+// Converts eight pattern bytes to a brush (inverted bytes, least-significant bit leftmost).
+QBrush patternToBrush(const Pattern& pattern);
+
+} // namespace Velmar::Private
