@@ -5,6 +5,8 @@
 
 #include <Velmar/CarbonEvents.h>
 
+#include <QString>
+
 namespace Velmar::Private {
 
 class EventQueueItem;
@@ -24,6 +26,10 @@ struct WindowEventHooks {
     void (*clearPendingUpdateEvents)(PendingUpdatePredicate pred, void* data) = nullptr;
     // Clears this window's pending update event.
     void (*clearPendingUpdateEvent)(AQtWindow* window) = nullptr;
+    // The window's title, for debugging texts.
+    QString (*windowTitle)(AQtWindow* window) = nullptr;
+    // Overrides the SupportLegacyMacEventProcessing feature flag (tests, DirectQtDrawing).
+    bool (*legacyEventProcessing)() = nullptr;
 };
 
 struct WaiterHooks {
@@ -47,6 +53,7 @@ UInt32 CountPendingUpdateEvents();
 EventQueueItem* FindPendingUpdateEvent(PendingUpdatePredicate pred, void* data);
 void ClearPendingUpdateEvents(PendingUpdatePredicate pred, void* data);
 void ClearPendingUpdateEvent(AQtWindow* window);
+QString WindowTitle(AQtWindow* window);
 bool EventWaiterActive();
 
 // Window update events stay with their windows instead of the queue.

@@ -1,0 +1,86 @@
+// The hooks through which the queue reaches windows and waiters.
+#include "events/EventQueueHooks.h"
+
+namespace Velmar::Private {
+
+namespace {
+
+WindowEventHooks gWindowHooks;
+WaiterHooks gWaiterHooks;
+
+} // namespace
+
+WindowEventHooks SetWindowEventHooks(const WindowEventHooks& hooks)
+{
+    WindowEventHooks old = gWindowHooks;
+    gWindowHooks = hooks;
+    return old;
+}
+
+WaiterHooks SetWaiterHooks(const WaiterHooks& hooks)
+{
+    WaiterHooks old = gWaiterHooks;
+    gWaiterHooks = hooks;
+    return old;
+}
+
+const WindowEventHooks& windowEventHooks()
+{
+    return gWindowHooks;
+}
+
+const WaiterHooks& waiterHooks()
+{
+    return gWaiterHooks;
+}
+
+bool WindowIsDeletePending(AQtWindow* window)
+{
+    return window && gWindowHooks.isDeletePending && gWindowHooks.isDeletePending(window);
+}
+
+bool WindowUpdateRegionIsEmpty(AQtWindow* window)
+{
+    return !window || !gWindowHooks.isUpdateRegionEmpty || gWindowHooks.isUpdateRegionEmpty(window);
+}
+
+UInt32 CountPendingUpdateEvents()
+{
+    return gWindowHooks.countPendingUpdateEvents ? gWindowHooks.countPendingUpdateEvents() : 0;
+}
+
+EventQueueItem* FindPendingUpdateEvent(PendingUpdatePredicate pred, void* data)
+{
+    return gWindowHooks.findPendingUpdateEvent ? gWindowHooks.findPendingUpdateEvent(pred, data) : nullptr;
+}
+
+void ClearPendingUpdateEvents(PendingUpdatePredicate pred, void* data)
+{
+    if (gWindowHooks.clearPendingUpdateEvents)
+        gWindowHooks.clearPendingUpdateEvents(pred, data);
+}
+
+void ClearPendingUpdateEvent(AQtWindow* window)
+{
+    if (window && gWindowHooks.clearPendingUpdateEvent)
+        gWindowHooks.clearPendingUpdateEvent(window);
+}
+
+QString WindowTitle(AQtWindow* window)
+{
+    return window && gWindowHooks.windowTitle ? gWindowHooks.windowTitle(window) : QString();
+}
+
+bool EventWaiterActive()
+{
+    return gWaiterHooks.isWaiterActive && gWaiterHooks.isWaiterActive();
+}
+
+bool LegacyEventProcessing()
+{
+    if (gWindowHooks.legacyEventProcessing)
+        return gWindowHooks.legacyEventProcessing();
+    return true;
+}
+
+} // namespace Velmar::Private
