@@ -1,0 +1,62 @@
+// The default decoration manager: leaves frames to the window system. Hosts with a shell
+// install a factory so that the application creates theirs instead.
+#include <Velmar/HostShell.h>
+
+namespace Velmar::Brindle {
+
+namespace {
+
+DecorationManager* defaultFactory(QMenuBar* menuBar, int mdiMode)
+{
+    return new DecorationManager(menuBar, mdiMode);
+}
+
+DecorationManager::Factory gFactory = defaultFactory;
+DecorationManager* gCurrent = nullptr;
+
+} // namespace
+
+DecorationManager::DecorationManager(QMenuBar* menuBar, int mdiMode)
+    : m_menuBar(menuBar), m_mdiMode(mdiMode), m_previous(gCurrent)
+{
+    gCurrent = this;
+}
+
+DecorationManager::~DecorationManager()
+{
+    if (gCurrent == this)
+        gCurrent = m_previous;
+}
+
+void DecorationManager::Decorate(ManagedWindow*) {}
+
+void DecorationManager::Undecorate(ManagedWindow*) {}
+
+QWidget* DecorationManager::HiddenDefaultParent() const
+{
+    return nullptr;
+}
+
+DecorationManager* DecorationManager::Instance()
+{
+    return gCurrent;
+}
+
+QWidget* DecorationManager::GetHiddenDefaultParent()
+{
+    return gCurrent ? gCurrent->HiddenDefaultParent() : nullptr;
+}
+
+DecorationManager* DecorationManager::Create(QMenuBar* menuBar, int mdiMode)
+{
+    return gFactory(menuBar, mdiMode);
+}
+
+DecorationManager::Factory DecorationManager::SetFactory(Factory factory)
+{
+    const Factory previous = gFactory;
+    gFactory = factory ? factory : defaultFactory;
+    return previous;
+}
+
+} // namespace Velmar::Brindle

@@ -1,0 +1,50 @@
+// The host's exception class and its log.
+#include <Velmar/HostCore.h>
+
+#include <QtGlobal>
+
+namespace Velmar {
+
+namespace {
+
+void defaultXErrorLogger(const XError& error)
+{
+    qCritical("XError (%s):    Error: %s Line: %d File: %s", error.GetType(), error.GetMessage(),
+              int(error.GetLine()), error.GetFile());
+}
+
+XErrorLogger gLogger = defaultXErrorLogger;
+
+} // namespace
+
+XError::XError(const char* type, const char* message, SInt32 line, const char* file)
+    : m_type(type ? type : ""), m_message(message ? message : ""), m_line(line),
+      m_file(file ? file : "")
+{
+}
+
+XError::~XError() = default;
+
+const char* XError::GetMessage() const
+{
+    return m_message.constData();
+}
+
+const char* XError::GetType() const
+{
+    return m_type.constData();
+}
+
+void LogXError(const XError& error)
+{
+    gLogger(error);
+}
+
+XErrorLogger SetXErrorLogger(XErrorLogger logger)
+{
+    const XErrorLogger previous = gLogger;
+    gLogger = logger ? logger : defaultXErrorLogger;
+    return previous;
+}
+
+} // namespace Velmar
