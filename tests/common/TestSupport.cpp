@@ -4,7 +4,12 @@
 
 #include "foundation/MessageHandler.h"
 
+#include <QApplication>
+#include <QDialog>
 #include <QSettings>
+#include <QTimer>
+
+#include <memory>
 
 namespace VelmarTest {
 
@@ -38,6 +43,54 @@ int LogCapture::count(const QString& fragment) const
     for (const QString& l : m_lines)
         n += l.contains(fragment) ? 1 : 0;
     return n;
+}
+
+ScriptedAutomationListener::ScriptedAutomationListener(QStringList answers, QString fallback)
+    : m_answers(std::move(answers))
+    , m_fallback(std::move(fallback))
+{
+    m_previous = Velmar::AutomationListenerManager::SetListener(this);
+}
+
+ScriptedAutomationListener::~ScriptedAutomationListener()
+{
+    Velmar::AutomationListenerManager::SetListener(m_previous);
+}
+
+QString ScriptedAutomationListener::AnswerDialog(const QString& title, const QString& text,
+                                                 const QString& choices)
+{
+    m_questions.append({title, text, choices});
+    if (m_responder)
+        return m_responder(m_questions.last());
+    return m_answers.isEmpty() ? m_fallback : m_answers.takeFirst();
+}
+
+void actOnNextModal(std::function<void(QWidget* modal)> act)
+{
+    // Polled from the modal loop itself; gives up (closing whatever is modal) after ~5 s.
+    auto* timer = new QTimer;
+    timer->setInterval(20);
+    auto acted = std::make_shared<bool>(false);
+    auto attempts = std::make_shared<int>(0);
+    QObject::connect(timer, &QTimer::timeout, timer, [timer, acted, attempts, act]() {
+        QWidget* modal = QApplication::activeModalWidget();
+        if (modal && !*acted) {
+            *acted = true;
+            act(modal);
+            modal = QApplication::activeModalWidget();
+        }
+        if (modal && (*acted || *attempts > 250)) {
+            if (auto* dialog = qobject_cast<QDialog*>(modal))
+                dialog->reject();
+            modal->close();
+        }
+        if (*acted || ++*attempts > 250) {
+            timer->stop();
+            timer->deleteLater();
+        }
+    });
+    timer->start();
 }
 
 void isolateSettings()

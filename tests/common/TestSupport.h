@@ -1,9 +1,13 @@
 // Shared helpers for the QtTest executables.
 #pragma once
 
+#include <Velmar/HostCore.h>
+
 #include <QStringList>
 #include <QTemporaryDir>
 #include <QtTest>
+
+#include <functional>
 
 namespace VelmarTest {
 
@@ -25,6 +29,46 @@ private:
     QStringList m_lines;
     QtMessageHandler m_previousHandler = nullptr;
 };
+
+// Answers every dialog the library asks about while it lives (installed as the host's
+// automation listener; the previous listener comes back on destruction). Answers are taken
+// from the queue in order; when it runs dry, `fallback` is given. A responder, when set,
+// runs instead of the queue and may do anything (raise a nested assertion, for instance).
+class ScriptedAutomationListener : public Velmar::AutomationListener {
+public:
+    struct Question {
+        QString title;
+        QString text;
+        QString choices;
+    };
+    using Responder = std::function<QString(const Question&)>;
+
+    explicit ScriptedAutomationListener(QStringList answers = {},
+                                        QString fallback = QStringLiteral("-1"));
+    ~ScriptedAutomationListener() override;
+    ScriptedAutomationListener(const ScriptedAutomationListener&) = delete;
+    ScriptedAutomationListener& operator=(const ScriptedAutomationListener&) = delete;
+
+    QString AnswerDialog(const QString& title, const QString& text,
+                         const QString& choices) override;
+
+    void setResponder(Responder responder) { m_responder = std::move(responder); }
+    void queue(const QString& answer) { m_answers.append(answer); }
+    const QList<Question>& questions() const { return m_questions; }
+    int count() const { return int(m_questions.size()); }
+
+private:
+    QStringList m_answers;
+    QString m_fallback;
+    Responder m_responder;
+    QList<Question> m_questions;
+    Velmar::AutomationListener* m_previous = nullptr;
+};
+
+// For tests that show a real modal box: polls for the active modal widget and hands it to
+// `act` (which clicks or closes it). If `act` leaves it open, or nothing acts within a few
+// seconds, the widget is closed anyway so that no test can hang on a dialog.
+void actOnNextModal(std::function<void(QWidget* modal)> act);
 
 // Points QSettings at a private temporary directory so tests never touch the user's
 // real settings. Call before any QSettings object exists (the test main macros do).
