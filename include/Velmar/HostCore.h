@@ -111,7 +111,8 @@ public:
     XError(const XError& other) = default;
     XError& operator=(const XError& other) = default;
     virtual ~XError();
-    virtual const char* GetMessage() const; // first virtual after the destructor: keep it so
+    // First virtual after the destructor: keep it so. (Not "GetMessage": <windows.h> renames that.)
+    virtual const char* GetErrorMessage() const;
     virtual const char* GetType() const;
     SInt32 GetLine() const { return m_line; }
     const char* GetFile() const { return m_file.constData(); }

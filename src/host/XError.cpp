@@ -9,7 +9,7 @@ namespace {
 
 void defaultXErrorLogger(const XError& error)
 {
-    qCritical("XError (%s):    Error: %s Line: %d File: %s", error.GetType(), error.GetMessage(),
+    qCritical("XError (%s):    Error: %s Line: %d File: %s", error.GetType(), error.GetErrorMessage(),
               int(error.GetLine()), error.GetFile());
 }
 
@@ -25,7 +25,7 @@ XError::XError(const char* type, const char* message, SInt32 line, const char* f
 
 XError::~XError() = default;
 
-const char* XError::GetMessage() const
+const char* XError::GetErrorMessage() const
 {
     return m_message.constData();
 }

@@ -21,9 +21,19 @@ void getKeyboardState(UInt8 state[256]);
 // The system's left mouse button, asked of the window system where there is one.
 bool isSystemLeftButtonDown();
 
+// The virtual key of the key that types `character` on the current layout (VkKeyScanA's low
+// byte); 0 when no key does. Without a window system to ask, the US layout.
+int virtualKeyForCharacter(char character);
+// The Windows language identifier of the keyboard layout (0x0409 US English, 0x040C French).
+// Off Windows it follows the input method's locale.
+int keyboardLanguageId();
+
 // Feeds Qt's own key and mouse events to the fallback state used where the window system
 // cannot be asked (offscreen, Wayland). Cheap; called from the application's event filter.
 void trackInputEvent(const QEvent* event);
+// Off: answer every key and button query from the tracked events even where the window
+// system could be asked (tests, and hosts that want only their own input counted).
+void setWindowSystemInputEnabled(bool enabled);
 
 // Writes one finished line to the debugger output channel (standard error off Windows).
 void debugOutput(const char* line);
@@ -32,7 +42,9 @@ void debugOutput(const char* line);
 bool isNativeInputPending();
 
 // Native window handle of a top-level widget, and native z-order placement: put `window`
-// directly behind `behind` (null: to the front).
+// directly behind `behind` (null: to the back). The library's window list is the order that
+// counts; X11 restacks sibling child widgets only and leaves top-level stacking to the
+// window manager, Windows makes the historical SetWindowPos call.
 void* nativeWindowHandle(QWidget* window);
 void placeNativeWindowBehind(QWidget* window, QWidget* behind);
 

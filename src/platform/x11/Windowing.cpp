@@ -1,0 +1,36 @@
+// Native windows off Windows: Qt's window ids, Qt's restacking and plain images.
+#include "platform/Platform.h"
+
+#include <QImage>
+#include <QWidget>
+
+namespace Velmar::Private::Platform {
+
+void* nativeWindowHandle(QWidget* window)
+{
+    if (!window)
+        return nullptr;
+    return reinterpret_cast<void*>(window->winId());
+}
+
+void placeNativeWindowBehind(QWidget* window, QWidget* behind)
+{
+    if (!window || window == behind)
+        return;
+    if (!behind) {
+        window->lower();
+        return;
+    }
+    // Qt restacks siblings; top-level windows are stacked by the window manager.
+    if (!window->isWindow() && window->parentWidget() == behind->parentWidget())
+        window->stackUnder(behind);
+}
+
+QImage createWindowImage(int width, int height)
+{
+    if (width <= 0 || height <= 0)
+        return QImage();
+    return QImage(width, height, QImage::Format_ARGB32_Premultiplied);
+}
+
+} // namespace Velmar::Private::Platform
