@@ -27,11 +27,31 @@ RGBColor::RGBColor(unsigned int argb)
     set(argb);
 }
 
+// channelF() * 65535 truncated, as the Toolbox helpers always did. Qt 6 hands out channelF()
+// in single precision, which would lose one step on half of the 16-bit values, so ordinary
+// colours take their exact 16-bit channels; only extended-range colours go through floats.
+static unsigned short channelFromFloat(float f)
+{
+    const double v = static_cast<double>(f) * 65535.0;
+    return v <= 0.0 ? 0 : v >= 65535.0 ? 65535 : static_cast<unsigned short>(v);
+}
+
 void RGBColor::set(const QColor& c)
 {
-    red = static_cast<unsigned short>(c.redF() * 65535.0);
-    green = static_cast<unsigned short>(c.greenF() * 65535.0);
-    blue = static_cast<unsigned short>(c.blueF() * 65535.0);
+    if (c.spec() == QColor::ExtendedRgb) {
+        red = channelFromFloat(c.redF());
+        green = channelFromFloat(c.greenF());
+        blue = channelFromFloat(c.blueF());
+        return;
+    }
+    if (!c.isValid()) {
+        red = green = blue = 0;
+        return;
+    }
+    const QRgba64 exact = c.toRgb().rgba64();
+    red = exact.red();
+    green = exact.green();
+    blue = exact.blue();
 }
 
 void RGBColor::set(unsigned int argb)
