@@ -76,12 +76,14 @@ UInt32 UpdateGWorld(GrafPtr* gw, SInt16 depth, const Rect* bounds, void* /*color
 
 void DisposeGWorld(GrafPtr offscreenGWorld)
 {
-    if (!offscreenGWorld || offscreenGWorld->window) {
+    // A stale pointer is never dereferenced: liveness is checked first.
+    const bool live = isLivePort(offscreenGWorld);
+    if (!offscreenGWorld || (live && offscreenGWorld->window)) {
         velmar_assert("offscreenGWorld != NULL && offscreenGWorld->window == NULL", __FILE__,
                       __LINE__, __func__, "DisposeGWorld needs an offscreen world");
         return;
     }
-    if (!isLivePort(offscreenGWorld)) {
+    if (!live) {
         VelmarLog(kLogGrafPort, "DisposeGWorld: %p is not a live world",
                   static_cast<void*>(offscreenGWorld));
         return;
