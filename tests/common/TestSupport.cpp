@@ -66,31 +66,34 @@ QString ScriptedAutomationListener::AnswerDialog(const QString& title, const QSt
     return m_answers.isEmpty() ? m_fallback : m_answers.takeFirst();
 }
 
-void actOnNextModal(std::function<void(QWidget* modal)> act)
+ModalActor::ModalActor(std::function<void(QWidget* modal)> act)
+    : m_act(std::move(act))
+    , m_timer(new QTimer)
 {
-    // Polled from the modal loop itself; gives up (closing whatever is modal) after ~5 s.
-    auto* timer = new QTimer;
-    timer->setInterval(20);
-    auto acted = std::make_shared<bool>(false);
-    auto attempts = std::make_shared<int>(0);
-    QObject::connect(timer, &QTimer::timeout, timer, [timer, acted, attempts, act]() {
+    // Polled from inside the modal loop; gives up after ~5 s, closing whatever is modal.
+    m_timer->setInterval(20);
+    QObject::connect(m_timer, &QTimer::timeout, m_timer, [this]() {
         QWidget* modal = QApplication::activeModalWidget();
-        if (modal && !*acted) {
-            *acted = true;
-            act(modal);
+        if (modal && !m_acted) {
+            m_acted = true;
+            m_act(modal);
             modal = QApplication::activeModalWidget();
         }
-        if (modal && (*acted || *attempts > 250)) {
+        const bool givingUp = ++m_attempts > 250;
+        if (modal && (m_acted || givingUp)) {
             if (auto* dialog = qobject_cast<QDialog*>(modal))
                 dialog->reject();
             modal->close();
         }
-        if (*acted || ++*attempts > 250) {
-            timer->stop();
-            timer->deleteLater();
-        }
+        if (m_acted || givingUp)
+            m_timer->stop();
     });
-    timer->start();
+    m_timer->start();
+}
+
+ModalActor::~ModalActor()
+{
+    delete m_timer;
 }
 
 void isolateSettings()

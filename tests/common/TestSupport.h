@@ -5,6 +5,7 @@
 
 #include <QStringList>
 #include <QTemporaryDir>
+#include <QTimer>
 #include <QtTest>
 
 #include <functional>
@@ -65,10 +66,24 @@ private:
     Velmar::AutomationListener* m_previous = nullptr;
 };
 
-// For tests that show a real modal box: polls for the active modal widget and hands it to
-// `act` (which clicks or closes it). If `act` leaves it open, or nothing acts within a few
-// seconds, the widget is closed anyway so that no test can hang on a dialog.
-void actOnNextModal(std::function<void(QWidget* modal)> act);
+// For tests that show a real modal box: while it lives, polls for the active modal widget
+// and hands the first one to `act` (which clicks or closes it). If `act` leaves it open, or
+// nothing acts within ~5 s, the widget is closed anyway so that no test can hang on a box.
+class ModalActor {
+public:
+    explicit ModalActor(std::function<void(QWidget* modal)> act);
+    ~ModalActor();
+    ModalActor(const ModalActor&) = delete;
+    ModalActor& operator=(const ModalActor&) = delete;
+
+    bool acted() const { return m_acted; }
+
+private:
+    std::function<void(QWidget*)> m_act;
+    QTimer* m_timer;
+    bool m_acted = false;
+    int m_attempts = 0;
+};
 
 // Points QSettings at a private temporary directory so tests never touch the user's
 // real settings. Call before any QSettings object exists (the test main macros do).

@@ -216,30 +216,30 @@ private Q_SLOTS:
     {
         QString title;
         QStringList buttons;
-        VelmarTest::actOnNextModal([&](QWidget* modal) {
-            auto* box = qobject_cast<QMessageBox*>(modal);
-            QVERIFY(box);
-            title = box->windowTitle();
-            for (QAbstractButton* b : box->buttons())
-                buttons << b->text().remove(u'&');
-            QCOMPARE(box->defaultButton(), box->button(QMessageBox::Ignore));
-            for (QAbstractButton* b : box->buttons()) {
-                if (b->text() == QStringLiteral("Ignore all"))
-                    b->click();
-            }
-        });
-        assertAt(120);
+        {
+            VelmarTest::ModalActor actor([&](QWidget* modal) {
+                auto* box = qobject_cast<QMessageBox*>(modal);
+                QVERIFY(box);
+                title = box->windowTitle();
+                for (QAbstractButton* b : box->buttons())
+                    buttons << b->text().remove(u'&');
+                QCOMPARE(box->defaultButton(), box->button(QMessageBox::Ignore));
+                for (QAbstractButton* b : box->buttons()) {
+                    if (b->text() == QStringLiteral("Ignore all"))
+                        b->click();
+                }
+            });
+            assertAt(120);
+        }
         QCOMPARE(title, QStringLiteral("Velmar assert"));
         QVERIFY(buttons.contains(QStringLiteral("Ignore all")));
         QCOMPARE(buttons.size(), 4);
 
-        // Ignored for good: no box appears (one would be closed by the safety net and
-        // counted here).
-        bool shown = false;
-        VelmarTest::actOnNextModal([&](QWidget*) { shown = true; });
+        // Ignored for good: no box appears.
+        VelmarTest::ModalActor actor([](QWidget*) {});
         assertAt(120);
         QTest::qWait(100);
-        QVERIFY(!shown);
+        QVERIFY(!actor.acted());
     }
 
     void fatalErrAnswers_data()
@@ -270,11 +270,14 @@ private Q_SLOTS:
     void realFatalBox()
     {
         // Closing the box counts as "Debugger".
-        VelmarTest::actOnNextModal([](QWidget* modal) { modal->close(); });
-        QCOMPARE(int(FatalErrDialog("m", "f.cpp", 1)), 4);
+        {
+            VelmarTest::ModalActor actor([](QWidget* modal) { modal->close(); });
+            QCOMPARE(int(FatalErrDialog("m", "f.cpp", 1)), 4);
+            QVERIFY(actor.acted());
+        }
 
         QStringList buttons;
-        VelmarTest::actOnNextModal([&](QWidget* modal) {
+        VelmarTest::ModalActor actor([&](QWidget* modal) {
             auto* box = qobject_cast<QMessageBox*>(modal);
             QVERIFY(box);
             QCOMPARE(box->defaultButton()->text(), QStringLiteral("Continue"));
