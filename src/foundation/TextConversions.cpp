@@ -3,8 +3,10 @@
 
 #include <Velmar/HostEncoding.h>
 
+#include <QVarLengthArray>
+
+#include <algorithm>
 #include <cstring>
-#include <vector>
 
 namespace Velmar {
 
@@ -19,15 +21,17 @@ QString MakeQString(const char* text, SInt32 length)
         return QString();
 
     // Grow until the whole conversion fits; one spare unit keeps the buffer terminated.
-    std::vector<unsigned short> buffer(n + 1, 0);
+    // Pascal strings (the common case, drawn on every DrawString) fit on the stack.
+    QVarLengthArray<unsigned short, 256 + 1> buffer(qsizetype(n) + 1);
     for (;;) {
+        std::fill(buffer.begin(), buffer.end(), 0);
         const SInt32 needed = CurrentMacMBCSEncodingToUTF16(text, int(n), buffer.data(),
                                                             int(buffer.size()));
         if (needed < SInt32(buffer.size()))
             break;
         if (needed >= INT32_MAX)
             return QString();
-        buffer.assign(size_t(needed) + 1, 0);
+        buffer.resize(qsizetype(needed) + 1);
     }
     // An embedded NUL converts to a 0 unit and ends the text.
     return QString::fromUtf16(reinterpret_cast<const char16_t*>(buffer.data()));

@@ -1,5 +1,6 @@
 // Pascal-string conversions and the Toolbox string calls, in the default Mac OS Roman.
 #include <Velmar/Diagnostics.h>
+#include <Velmar/HostCore.h>
 #include <Velmar/HostEncoding.h>
 #include <Velmar/TextUtils.h>
 
@@ -23,6 +24,13 @@ const unsigned char* up(const QByteArray& p)
 {
     return reinterpret_cast<const unsigned char*>(p.constData());
 }
+
+// Reports a fixed menu bar height for one screen only, so asking the wrong screen shows.
+class FakeScreens : public AScreenManOS {
+public:
+    SInt32 GetCurrentScreen() const override { return 2; }
+    SInt16 GetMenuBarHeight(SInt32 screen) const override { return screen == 2 ? 23 : -1; }
+};
 
 } // namespace
 
@@ -278,6 +286,15 @@ private Q_SLOTS:
         QCOMPARE(EventTimeToTicks(std::numeric_limits<double>::quiet_NaN()), 0);
         SysBeep(30);
         QVERIFY(GetMBarHeight() >= 0);
+    }
+
+    void menuBarHeightFromScreenManager()
+    {
+        FakeScreens screens;
+        AScreenManOS::SetInstance(&screens);
+        const SInt16 height = GetMBarHeight();
+        AScreenManOS::SetInstance(nullptr);
+        QCOMPARE(height, SInt16(23));
     }
 };
 
