@@ -1,0 +1,99 @@
+// Region set algebra, translation, whole-pixel insetting and rectangle-to-rectangle mapping.
+#include <Velmar/QDRegions.h>
+
+#include "quickdraw/RegionOps.h"
+#include "foundation/Conversions.h"
+#include "quickdraw/ShapeLog.h"
+
+#include <QRegion>
+#include <QTransform>
+
+#include <cstdlib>
+
+namespace Velmar {
+
+namespace {
+
+template <typename Op>
+void combine(RgnHandle a, RgnHandle b, RgnHandle dst, Op op)
+{
+    if (!dst || !a || !b)
+        return;
+    *dst = op(*a, *b);
+}
+
+} // namespace
+
+void UnionRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, [](const QRegion& x, const QRegion& y) { return x.united(y); });
+}
+
+void SectRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, [](const QRegion& x, const QRegion& y) { return x.intersected(y); });
+}
+
+void DiffRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, [](const QRegion& x, const QRegion& y) { return x.subtracted(y); });
+}
+
+void XorRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, [](const QRegion& x, const QRegion& y) { return x.xored(y); });
+}
+
+void OffsetRgn(RgnHandle rgn, short dh, short dv)
+{
+    if (rgn)
+        rgn->translate(dh, dv);
+}
+
+void InsetRgn(RgnHandle rgn, short dh, short dv)
+{
+    if (rgn)
+        *rgn = Private::insetRegion(*rgn, dh, dv);
+}
+
+void MapRgn(RgnHandle rgn, const Rect* src, const Rect* dst)
+{
+    if (!rgn)
+        return;
+    if (!src || !dst) {
+        Private::shapeWarning("warning: MapRgn: null rectangle");
+        return;
+    }
+    const int srcWidth = src->right - src->left, srcHeight = src->bottom - src->top;
+    if (srcWidth == 0 || srcHeight == 0) {
+        // The map has no scale; the region is left as it was.
+        Private::shapeWarning("warning: MapRgn: empty source rectangle");
+        return;
+    }
+    const double sx = double(dst->right - dst->left) / srcWidth;
+    const double sy = double(dst->bottom - dst->top) / srcHeight;
+    const QTransform map(sx, 0, 0, sy, dst->left - src->left * sx, dst->top - src->top * sy);
+    *rgn = map.map(*rgn);
+}
+
+} // namespace Velmar
+
+namespace Velmar::Private {
+
+// One step shrinks (intersection) or grows (union) the region by a pixel on both sides of
+// one axis; steps repeat |d| times. Shrinking stops early once nothing is left.
+QRegion insetRegion(const QRegion& region, int dh, int dv)
+{
+    QRegion r = region;
+    const auto steps = [&r](int d, int mx, int my) {
+        for (int i = std::abs(d); i > 0 && !r.isEmpty(); --i) {
+            const QRegion a = r.translated(-mx, -my), b = r.translated(mx, my);
+            r = d > 0 ? r.intersected(a).intersected(b) : r.united(a).united(b);
+        }
+    };
+    steps(dh, 1, 0);
+    steps(dv, 0, 1);
+    return r;
+}
+
+} // namespace Velmar::Private

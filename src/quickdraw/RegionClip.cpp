@@ -1,0 +1,73 @@
+// The current port's clip as regions, and the desktop region.
+#include <Velmar/QDRegions.h>
+#include <Velmar/QtGrafPort.h>
+
+#include "foundation/Conversions.h"
+#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/ShapeLog.h"
+
+#include <QGuiApplication>
+#include <QScreen>
+
+namespace Velmar {
+
+using namespace Private;
+
+// The port's stored clip, in force or not; a fresh port's is the wide-open rectangle.
+void GetClip(RgnHandle rgn)
+{
+    QtGrafPort* port = currentGrafPort();
+    if (!port) {
+        warnNoPort("warning: GetClip: cannot get current port");
+        return;
+    }
+    if (!rgn) {
+        shapeWarning("warning: GetClip: null region");
+        return;
+    }
+    *rgn = port->clipRegion;
+}
+
+void SetClip(RgnHandle rgn)
+{
+    QtGrafPort* port = currentGrafPort();
+    if (!port) {
+        warnNoPort("warning: SetClip: cannot get current port");
+        return;
+    }
+    if (!rgn) {
+        shapeWarning("warning: SetClip: null region");
+        return;
+    }
+    SetPortClipRegion(port, rgn);
+}
+
+void ClipRect(const Rect* r)
+{
+    QtGrafPort* port = currentGrafPort();
+    if (!port) {
+        warnNoPort("warning: ClipRect: cannot get current port");
+        return;
+    }
+    if (!r) {
+        shapeWarning("warning: ClipRect: null rectangle");
+        return;
+    }
+    QRegion region(toQRect(r));
+    SetPortClipRegion(port, &region);
+}
+
+// Recomputed at every call so that screens coming and going are seen.
+RgnHandle GetGrayRgn()
+{
+    static QRegion gray;
+    gray = QRegion();
+    if (qobject_cast<QGuiApplication*>(QCoreApplication::instance())) {
+        const QList<QScreen*> screens = QGuiApplication::screens();
+        for (QScreen* screen : screens)
+            gray += screen->availableGeometry();
+    }
+    return &gray;
+}
+
+} // namespace Velmar

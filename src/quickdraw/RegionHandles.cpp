@@ -1,0 +1,112 @@
+// Region handles: lifetime, content and the region tests.
+#include <Velmar/QDRegions.h>
+
+#include "foundation/Conversions.h"
+#include "quickdraw/ShapeLog.h"
+
+#include <QRegion>
+
+namespace Velmar {
+
+using Private::toQRect;
+using Private::shapeWarning;
+
+RgnHandle NewRgn()
+{
+    return new QRegion;
+}
+
+void DisposeRgn(RgnHandle rgn)
+{
+    delete rgn;
+}
+
+void CopyRgn(RgnHandle src, RgnHandle dst)
+{
+    if (!src || !dst) {
+        shapeWarning("warning: CopyRgn: null region");
+        return;
+    }
+    if (src != dst)
+        *dst = *src;
+}
+
+void SetEmptyRgn(RgnHandle rgn)
+{
+    if (!rgn) {
+        shapeWarning("warning: SetEmptyRgn: null region");
+        return;
+    }
+    *rgn = QRegion();
+}
+
+void RectRgn(RgnHandle rgn, const Rect* r)
+{
+    if (!rgn)
+        return;
+    // An empty rectangle (left >= right or top >= bottom) gives the empty region.
+    *rgn = QRegion(toQRect(r));
+}
+
+void SetRectRgn(RgnHandle rgn, short left, short top, short right, short bottom)
+{
+    Rect r;
+    r.top = top;
+    r.left = left;
+    r.bottom = bottom;
+    r.right = right;
+    RectRgn(rgn, &r);
+}
+
+unsigned char PtInRgn(Point pt, RgnHandle rgn)
+{
+    if (!rgn)
+        return 0;
+    return rgn->contains(Private::toQPoint(pt)) ? 1 : 0;
+}
+
+unsigned char RectInRgn(const Rect* r, RgnHandle rgn)
+{
+    if (!rgn || !r)
+        return 0;
+    const QRect q = toQRect(r);
+    if (!q.isValid())
+        return 0;
+    return rgn->intersects(q) ? 1 : 0;
+}
+
+// Two null handles are equal, as EqualRect treats two null rectangles.
+unsigned char EqualRgn(RgnHandle a, RgnHandle b)
+{
+    if (!a || !b) {
+        shapeWarning("warning: EqualRgn: null region");
+        return (!a && !b) ? 1 : 0;
+    }
+    return *a == *b ? 1 : 0;
+}
+
+// A null handle counts as empty, as a null rectangle does.
+unsigned char EmptyRgn(RgnHandle rgn)
+{
+    if (!rgn) {
+        shapeWarning("warning: EmptyRgn: null region");
+        return 1;
+    }
+    return rgn->isEmpty() ? 1 : 0;
+}
+
+Rect* GetRegionBounds(RgnHandle rgn, Rect* bounds)
+{
+    if (!bounds)
+        return nullptr;
+    if (!rgn) {
+        shapeWarning("warning: GetRegionBounds: null region");
+        *bounds = Rect{0, 0, 0, 0};
+        return bounds;
+    }
+    const QRect q = rgn->boundingRect();
+    *bounds = q.isEmpty() ? Rect{0, 0, 0, 0} : Private::toRect(q);
+    return bounds;
+}
+
+} // namespace Velmar

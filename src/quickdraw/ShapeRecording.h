@@ -1,0 +1,28 @@
+// Recording of outlines while a polygon (OpenPoly) or a region (OpenRgn) is being defined:
+// MoveTo and LineTo append points to the open polygon, frame calls XOR into the region.
+#pragma once
+
+#include <Velmar/QtGrafPort.h>
+
+namespace Velmar::Private {
+
+// While the port defines a region: XORs `shape` into the region being defined and returns
+// true (the caller then draws nothing). Otherwise returns false.
+bool recordFrameShape(QtGrafPort* port, const QRegion& shape);
+
+// While the port defines a polygon or a region: appends (h, v) to the open polygon.
+// Returns true when the port is recording.
+bool recordPenPoint(QtGrafPort* port, int h, int v);
+
+// Drops whatever the port is recording. A region's scratch polygon and region are freed;
+// an open polygon belongs to its caller and is only let go.
+void discardRecording(QtGrafPort* port);
+
+// Called when a polygon is killed: a port still recording into it stops recording, so that
+// its polygon pointer never dangles.
+void forgetOpenPoly(PolyPtr* poly);
+
+// A polygon's area under the odd-even rule.
+QRegion polygonRegion(const QPolygon& polygon);
+
+} // namespace Velmar::Private

@@ -1,0 +1,220 @@
+// Rectangle and point utilities: the Toolbox field order and the deliberate departures
+// (SectRect leaving its result alone for empty inputs, null pointers counting as empty).
+#include "TestSupport.h"
+
+#include <Velmar/Diagnostics.h>
+#include <Velmar/QDShapes.h>
+
+Q_DECLARE_METATYPE(Rect)
+
+namespace {
+
+Rect R(int top, int left, int bottom, int right)
+{
+    return Rect{std::int16_t(top), std::int16_t(left), std::int16_t(bottom), std::int16_t(right)};
+}
+
+Point P(int h, int v)
+{
+    Point p;
+    p.h = std::int16_t(h);
+    p.v = std::int16_t(v);
+    return p;
+}
+
+bool same(const Rect& a, const Rect& b)
+{
+    return Velmar::EqualRect(&a, &b) != 0;
+}
+
+QByteArray show(const Rect& r)
+{
+    return QByteArray::number(r.top) + "," + QByteArray::number(r.left) + ","
+        + QByteArray::number(r.bottom) + "," + QByteArray::number(r.right);
+}
+
+} // namespace
+
+using namespace Velmar;
+
+class TestRectUtils : public QObject {
+    Q_OBJECT
+private Q_SLOTS:
+    void initTestCase() { SetLogCategory(kLogQuickDraw, true); }
+
+    void setRectStoresInFieldOrder()
+    {
+        Rect r{};
+        SetRect(&r, 1, 2, 3, 4); // left, top, right, bottom
+        QCOMPARE(r.left, 1);
+        QCOMPARE(r.top, 2);
+        QCOMPARE(r.right, 3);
+        QCOMPARE(r.bottom, 4);
+        SetRect(nullptr, 1, 2, 3, 4); // ignored
+    }
+
+    void emptyRect_data()
+    {
+        QTest::addColumn<Rect>("r");
+        QTest::addColumn<bool>("empty");
+        QTest::newRow("normal") << R(0, 0, 10, 10) << false;
+        QTest::newRow("one pixel") << R(5, 5, 6, 6) << false;
+        QTest::newRow("zero height") << R(10, 10, 10, 20) << true;
+        QTest::newRow("zero width") << R(10, 20, 30, 20) << true;
+        QTest::newRow("inverted") << R(10, 10, 0, 0) << true;
+    }
+    void emptyRect()
+    {
+        QFETCH(Rect, r);
+        QFETCH(bool, empty);
+        QCOMPARE(EmptyRect(&r) != 0, empty);
+    }
+    void emptyRectNullIsEmpty() { QCOMPARE(EmptyRect(nullptr), 1); }
+
+    void offsetRect()
+    {
+        Rect r = R(10, 20, 30, 40);
+        OffsetRect(&r, 5, -5);
+        QVERIFY(same(r, R(5, 25, 25, 45)));
+        VelmarTest::LogCapture log;
+        OffsetRect(nullptr, 1, 1); // guarded, logged
+        QVERIFY(log.contains("OffsetRect"));
+    }
+
+    void insetRect_data()
+    {
+        QTest::addColumn<Rect>("in");
+        QTest::addColumn<int>("dh");
+        QTest::addColumn<int>("dv");
+        QTest::addColumn<Rect>("out");
+        QTest::newRow("shrink") << R(0, 0, 10, 10) << 2 << 3 << R(3, 2, 7, 8);
+        QTest::newRow("grow") << R(0, 0, 10, 10) << -1 << -2 << R(-2, -1, 12, 11);
+        QTest::newRow("width gone") << R(0, 0, 10, 10) << 5 << 0 << R(0, 0, 0, 0);
+        QTest::newRow("height gone") << R(5, 5, 10, 50) << 0 << 3 << R(0, 0, 0, 0);
+        QTest::newRow("one left") << R(0, 0, 11, 11) << 5 << 5 << R(5, 5, 6, 6);
+    }
+    void insetRect()
+    {
+        QFETCH(Rect, in);
+        QFETCH(int, dh);
+        QFETCH(int, dv);
+        QFETCH(Rect, out);
+        InsetRect(&in, short(dh), short(dv));
+        QVERIFY2(same(in, out), show(in));
+        InsetRect(nullptr, 1, 1);
+    }
+
+    // Inset by d then by -d gives the rectangle back whenever it survived the first step.
+    void insetRectRoundTrip()
+    {
+        for (int d = 0; d < 6; ++d) {
+            Rect r = R(3, 4, 20, 30);
+            InsetRect(&r, short(d), short(d));
+            InsetRect(&r, short(-d), short(-d));
+            QVERIFY2(same(r, R(3, 4, 20, 30)), show(r));
+        }
+    }
+
+    void sectRect_data()
+    {
+        QTest::addColumn<Rect>("a");
+        QTest::addColumn<Rect>("b");
+        QTest::addColumn<int>("result");
+        QTest::addColumn<Rect>("out");
+        QTest::newRow("overlap") << R(0, 0, 10, 10) << R(5, 5, 20, 20) << 1 << R(5, 5, 10, 10);
+        QTest::newRow("inside") << R(0, 0, 10, 10) << R(2, 3, 4, 5) << 1 << R(2, 3, 4, 5);
+        QTest::newRow("apart") << R(0, 0, 10, 10) << R(20, 20, 30, 30) << 0 << R(0, 0, 0, 0);
+        QTest::newRow("touching") << R(0, 0, 10, 10) << R(0, 10, 10, 20) << 0 << R(0, 0, 0, 0);
+    }
+    void sectRect()
+    {
+        QFETCH(Rect, a);
+        QFETCH(Rect, b);
+        QFETCH(int, result);
+        QFETCH(Rect, out);
+        Rect got = R(-7, -7, -7, -7);
+        QCOMPARE(int(SectRect(&a, &b, &got)), result);
+        QVERIFY2(same(got, out), show(got));
+        got = R(-7, -7, -7, -7);
+        QCOMPARE(int(SectRect(&b, &a, &got)), result); // symmetric
+        QVERIFY2(same(got, out), show(got));
+    }
+    void sectRectLeavesResultForEmptyOrNullInput()
+    {
+        const Rect sentinel = R(1, 2, 3, 4);
+        const Rect empty = R(10, 10, 10, 20), full = R(0, 0, 50, 50);
+        Rect out = sentinel;
+        QCOMPARE(SectRect(&empty, &full, &out), 0);
+        QVERIFY(same(out, sentinel));
+        QCOMPARE(SectRect(&full, &empty, &out), 0);
+        QCOMPARE(SectRect(nullptr, &full, &out), 0);
+        QCOMPARE(SectRect(&full, nullptr, &out), 0);
+        QVERIFY(same(out, sentinel));
+        QCOMPARE(SectRect(&full, &full, nullptr), 1); // no result slot: answer only
+        // The result may alias an input.
+        Rect a = R(0, 0, 10, 10);
+        const Rect b = R(5, 5, 20, 20);
+        QCOMPARE(SectRect(&a, &b, &a), 1);
+        QVERIFY(same(a, R(5, 5, 10, 10)));
+    }
+
+    void unionRect()
+    {
+        const Rect a = R(0, 0, 10, 10), b = R(20, 30, 25, 35);
+        Rect out{};
+        UnionRect(&a, &b, &out);
+        QVERIFY2(same(out, R(0, 0, 25, 35)), show(out));
+        UnionRect(&a, nullptr, &out); // null is left out
+        QVERIFY(same(out, a));
+        UnionRect(nullptr, &b, &out);
+        QVERIFY(same(out, b));
+        UnionRect(&a, &b, nullptr);
+    }
+
+    void ptInRectExcludesRightAndBottomEdges()
+    {
+        const Rect r = R(10, 10, 20, 20);
+        QCOMPARE(PtInRect(P(10, 10), &r), 1);
+        QCOMPARE(PtInRect(P(19, 19), &r), 1);
+        QCOMPARE(PtInRect(P(20, 15), &r), 0);
+        QCOMPARE(PtInRect(P(15, 20), &r), 0);
+        QCOMPARE(PtInRect(P(9, 15), &r), 0);
+        QCOMPARE(PtInRect(P(15, 15), nullptr), 0);
+    }
+
+    void equalRect()
+    {
+        const Rect a = R(1, 2, 3, 4), b = R(1, 2, 3, 4), c = R(1, 2, 3, 5);
+        QCOMPARE(EqualRect(&a, &b), 1);
+        QCOMPARE(EqualRect(&a, &c), 0);
+        QCOMPARE(EqualRect(nullptr, nullptr), 1);
+        QCOMPARE(EqualRect(&a, nullptr), 0);
+        QCOMPARE(EqualRect(nullptr, &a), 0);
+    }
+
+    void pt2Rect()
+    {
+        Rect r{};
+        Pt2Rect(P(30, 5), P(10, 25), &r);
+        QVERIFY2(same(r, R(5, 10, 25, 30)), show(r));
+        Pt2Rect(P(1, 1), P(2, 2), nullptr);
+    }
+
+    void points()
+    {
+        Point p{};
+        SetPt(&p, 3, 4);
+        QCOMPARE(p.h, 3);
+        QCOMPARE(p.v, 4);
+        SetPt(nullptr, 1, 1);
+        QCOMPARE(EqualPt(p, P(3, 4)), 1);
+        QCOMPARE(EqualPt(p, P(4, 3)), 0);
+        AddPt(P(1, 2), &p);
+        QVERIFY(EqualPt(p, P(4, 6)));
+        SubPt(P(4, 6), &p);
+        QVERIFY(EqualPt(p, P(0, 0)));
+    }
+};
+
+VELMAR_TEST_MAIN(TestRectUtils)
+#include "tst_rectutils.moc"

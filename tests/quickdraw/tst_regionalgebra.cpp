@@ -1,0 +1,271 @@
+// Region handles and arithmetic, checked by set identities and exact pixel sets
+// rather than by restating the calls.
+#include "TestSupport.h"
+
+#include <Velmar/Diagnostics.h>
+#include <Velmar/QDRegions.h>
+
+#include <QRandomGenerator>
+#include <QRegion>
+
+#include <memory>
+
+using namespace Velmar;
+
+namespace {
+
+struct RgnDeleter {
+    void operator()(QRegion* r) const { DisposeRgn(r); }
+};
+using Rgn = std::unique_ptr<QRegion, RgnDeleter>;
+
+Rgn make() { return Rgn(NewRgn()); }
+
+Rgn rectRgn(int left, int top, int right, int bottom)
+{
+    Rgn r = make();
+    SetRectRgn(r.get(), short(left), short(top), short(right), short(bottom));
+    return r;
+}
+
+// A region made of a few random rectangles inside a 40x40 box.
+Rgn randomRgn(QRandomGenerator& gen)
+{
+    Rgn r = make();
+    const int n = 1 + gen.bounded(5);
+    for (int i = 0; i < n; ++i) {
+        const int l = gen.bounded(40), t = gen.bounded(40);
+        Rgn part = rectRgn(l, t, l + 1 + gen.bounded(15), t + 1 + gen.bounded(15));
+        UnionRgn(r.get(), part.get(), r.get());
+    }
+    return r;
+}
+
+Point P(int h, int v)
+{
+    Point p;
+    p.h = std::int16_t(h);
+    p.v = std::int16_t(v);
+    return p;
+}
+
+// The pixels of a region inside a box, as a bit set, asked through PtInRgn.
+QBitArray pixels(RgnHandle r, int size = 64, int origin = -12)
+{
+    QBitArray bits(size * size);
+    for (int y = 0; y < size; ++y)
+        for (int x = 0; x < size; ++x)
+            bits.setBit(y * size + x, PtInRgn(P(origin + x, origin + y), r) != 0);
+    return bits;
+}
+
+Rect bounds(RgnHandle r)
+{
+    Rect b{};
+    GetRegionBounds(r, &b);
+    return b;
+}
+
+} // namespace
+
+class TestRegionAlgebra : public QObject {
+    Q_OBJECT
+private Q_SLOTS:
+    void initTestCase() { SetLogCategory(kLogQuickDraw, true); }
+
+    void lifetimeAndContent()
+    {
+        Rgn r = make();
+        QVERIFY(EmptyRgn(r.get()));
+        const Rect rect{10, 20, 30, 60};
+        RectRgn(r.get(), &rect);
+        QVERIFY(!EmptyRgn(r.get()));
+        QCOMPARE(r->boundingRect(), QRect(20, 10, 40, 20)); // exactly the Toolbox pixels
+        const Rect b = bounds(r.get());
+        QVERIFY(b.top == 10 && b.left == 20 && b.bottom == 30 && b.right == 60);
+        Rgn copy = make();
+        CopyRgn(r.get(), copy.get());
+        QVERIFY(EqualRgn(r.get(), copy.get()));
+        SetEmptyRgn(r.get());
+        QVERIFY(EmptyRgn(r.get()));
+        QVERIFY(!EqualRgn(r.get(), copy.get()));
+        RectRgn(copy.get(), nullptr); // null rectangle: empty region
+        QVERIFY(EmptyRgn(copy.get()));
+        SetRectRgn(copy.get(), 10, 10, 5, 20); // inverted: empty
+        QVERIFY(EmptyRgn(copy.get()));
+    }
+
+    void nullHandlesAreSafe()
+    {
+        VelmarTest::LogCapture log;
+        Rgn a = rectRgn(0, 0, 10, 10);
+        Rgn dst = rectRgn(50, 50, 60, 60);
+        const QRegion before = *dst;
+        UnionRgn(a.get(), nullptr, dst.get());
+        SectRgn(nullptr, a.get(), dst.get());
+        DiffRgn(a.get(), nullptr, dst.get());
+        XorRgn(nullptr, nullptr, dst.get());
+        QCOMPARE(*dst, before);
+        UnionRgn(a.get(), a.get(), nullptr);
+        DisposeRgn(nullptr);
+        CopyRgn(nullptr, dst.get());
+        CopyRgn(a.get(), nullptr);
+        SetEmptyRgn(nullptr);
+        RectRgn(nullptr, nullptr);
+        OffsetRgn(nullptr, 1, 1);
+        InsetRgn(nullptr, 1, 1);
+        MapRgn(nullptr, nullptr, nullptr);
+        QCOMPARE(PtInRgn(P(1, 1), nullptr), 0);
+        const Rect r{0, 0, 5, 5};
+        QCOMPARE(RectInRgn(&r, nullptr), 0);
+        QCOMPARE(RectInRgn(nullptr, a.get()), 0);
+        QCOMPARE(EmptyRgn(nullptr), 1);
+        QCOMPARE(EqualRgn(nullptr, nullptr), 1);
+        QCOMPARE(EqualRgn(a.get(), nullptr), 0);
+        QCOMPARE(GetRegionBounds(a.get(), nullptr), nullptr);
+        Rect b{1, 1, 1, 1};
+        QCOMPARE(GetRegionBounds(nullptr, &b), &b);
+        QVERIFY(b.top == 0 && b.left == 0 && b.bottom == 0 && b.right == 0);
+        QVERIFY(log.contains("CopyRgn"));
+        QVERIFY(log.contains("EmptyRgn"));
+    }
+
+    // The identities hold for random regions, checked pixel by pixel.
+    void setIdentities()
+    {
+        QRandomGenerator gen(1234);
+        for (int round = 0; round < 60; ++round) {
+            Rgn a = randomRgn(gen), b = randomRgn(gen);
+            Rgn u = make(), s = make(), d = make(), x = make(), t = make();
+            UnionRgn(a.get(), b.get(), u.get());
+            SectRgn(a.get(), b.get(), s.get());
+            DiffRgn(a.get(), b.get(), d.get());
+            XorRgn(a.get(), b.get(), x.get());
+            const QBitArray pa = pixels(a.get()), pb = pixels(b.get());
+            QCOMPARE(pixels(u.get()), pa | pb);
+            QCOMPARE(pixels(s.get()), pa & pb);
+            QCOMPARE(pixels(d.get()), pa & ~pb);
+            QCOMPARE(pixels(x.get()), pa ^ pb);
+            // A u B contains A; (A - B) n B is empty; XOR = (A u B) - (A n B).
+            SectRgn(u.get(), a.get(), t.get());
+            QVERIFY(EqualRgn(t.get(), a.get()));
+            SectRgn(d.get(), b.get(), t.get());
+            QVERIFY(EmptyRgn(t.get()));
+            DiffRgn(u.get(), s.get(), t.get());
+            QVERIFY(EqualRgn(t.get(), x.get()));
+            // Offset then the inverse offset is the identity.
+            CopyRgn(a.get(), t.get());
+            OffsetRgn(t.get(), 7, -3);
+            QCOMPARE(PtInRgn(P(7, -3), t.get()), PtInRgn(P(0, 0), a.get()));
+            OffsetRgn(t.get(), -7, 3);
+            QVERIFY(EqualRgn(t.get(), a.get()));
+            // Growing then shrinking by the same amount contains the original.
+            CopyRgn(a.get(), t.get());
+            InsetRgn(t.get(), -2, -2);
+            InsetRgn(t.get(), 2, 2);
+            DiffRgn(a.get(), t.get(), s.get());
+            QVERIFY(EmptyRgn(s.get()));
+            // Shrinking keeps only pixels of the original.
+            CopyRgn(a.get(), t.get());
+            InsetRgn(t.get(), 1, 1);
+            DiffRgn(t.get(), a.get(), s.get());
+            QVERIFY(EmptyRgn(s.get()));
+            // The destination may be one of the sources.
+            CopyRgn(a.get(), t.get());
+            UnionRgn(t.get(), b.get(), t.get());
+            QVERIFY(EqualRgn(t.get(), u.get()));
+        }
+    }
+
+    void insetRgn_data()
+    {
+        QTest::addColumn<int>("dh");
+        QTest::addColumn<int>("dv");
+        QTest::addColumn<QRect>("expected"); // of the 10x10 region at (0, 0); null = empty
+        QTest::newRow("2,2 centred 6x6") << 2 << 2 << QRect(2, 2, 6, 6);
+        QTest::newRow("-1,0 is 12x10") << -1 << 0 << QRect(-1, 0, 12, 10);
+        QTest::newRow("0,-3") << 0 << -3 << QRect(0, -3, 10, 16);
+        QTest::newRow("5,0 leaves nothing") << 5 << 0 << QRect();
+        QTest::newRow("4,4 leaves 2x2") << 4 << 4 << QRect(4, 4, 2, 2);
+        QTest::newRow("0,0 unchanged") << 0 << 0 << QRect(0, 0, 10, 10);
+        QTest::newRow("big shrink") << 3000 << 0 << QRect();
+    }
+    void insetRgn()
+    {
+        QFETCH(int, dh);
+        QFETCH(int, dv);
+        QFETCH(QRect, expected);
+        Rgn r = rectRgn(0, 0, 10, 10);
+        InsetRgn(r.get(), short(dh), short(dv));
+        QCOMPARE(*r, expected.isNull() ? QRegion() : QRegion(expected));
+    }
+
+    // On a rectangle, insetting a region is insetting the rectangle, both ways round.
+    void insetRgnMatchesInsetRectAndRoundTrips()
+    {
+        for (int d = -3; d <= 3; ++d) {
+            Rgn r = rectRgn(5, 7, 25, 19);
+            InsetRgn(r.get(), short(d), short(d));
+            QCOMPARE(r->boundingRect(), QRect(5 + d, 7 + d, 20 - 2 * d, 12 - 2 * d));
+            QCOMPARE(r->rectCount(), 1);
+            InsetRgn(r.get(), short(-d), short(-d));
+            Rgn original = rectRgn(5, 7, 25, 19);
+            QVERIFY(EqualRgn(r.get(), original.get()));
+        }
+    }
+
+    // An L shape: shrinking removes a pixel from every boundary, including the inner corner.
+    void insetRgnOfLShape()
+    {
+        Rgn l = rectRgn(0, 0, 10, 4);
+        Rgn leg = rectRgn(0, 0, 4, 10);
+        UnionRgn(l.get(), leg.get(), l.get());
+        InsetRgn(l.get(), 1, 1);
+        QRegion expected = QRegion(1, 1, 8, 2).united(QRegion(1, 1, 2, 8));
+        QCOMPARE(*l, expected);
+    }
+
+    void mapRgn()
+    {
+        Rgn r = rectRgn(10, 10, 20, 20);
+        const Rect src{0, 0, 100, 100}, dst{50, 50, 150, 250}; // x2 horizontally, +50 both ways
+        MapRgn(r.get(), &src, &dst);
+        QCOMPARE(r->boundingRect(), QRect(70, 60, 20, 10));
+        // Mapping back restores the region.
+        MapRgn(r.get(), &dst, &src);
+        Rgn original = rectRgn(10, 10, 20, 20);
+        QVERIFY(EqualRgn(r.get(), original.get()));
+        // Identity map.
+        MapRgn(r.get(), &src, &src);
+        QVERIFY(EqualRgn(r.get(), original.get()));
+        // An empty source is refused with a log line and leaves the region alone.
+        VelmarTest::LogCapture log;
+        const Rect empty{0, 0, 0, 10};
+        MapRgn(r.get(), &empty, &dst);
+        QVERIFY(EqualRgn(r.get(), original.get()));
+        QVERIFY(log.contains("MapRgn"));
+    }
+
+    void rectInRgnMeansIntersects()
+    {
+        Rgn r = rectRgn(10, 10, 20, 20);
+        const Rect touching{0, 0, 10, 10}, corner{19, 19, 30, 30}, around{0, 0, 50, 50};
+        const Rect empty{15, 15, 15, 15};
+        QCOMPARE(RectInRgn(&touching, r.get()), 0); // right/bottom edges are outside
+        QCOMPARE(RectInRgn(&corner, r.get()), 1);
+        QCOMPARE(RectInRgn(&around, r.get()), 1);
+        QCOMPARE(RectInRgn(&empty, r.get()), 0);
+        QCOMPARE(PtInRgn(P(19, 19), r.get()), 1);
+        QCOMPARE(PtInRgn(P(20, 19), r.get()), 0);
+    }
+
+    void emptyRegionBounds()
+    {
+        Rgn r = make();
+        const Rect b = bounds(r.get());
+        QVERIFY(b.top == 0 && b.left == 0 && b.bottom == 0 && b.right == 0);
+    }
+};
+
+VELMAR_TEST_MAIN(TestRegionAlgebra)
+#include "tst_regionalgebra.moc"
