@@ -41,6 +41,8 @@ QByteArray MakeLocal8Bit(const QString& s)
 {
     const qsizetype length = s.size();
     const qsizetype capacity = (length + 1) * 4;
+    if (capacity > INT32_MAX) // beyond what the 32-bit conversion call can describe
+        return QByteArray(1, '\0');
     QByteArray bytes(capacity, '\0');
     bool lossy = false;
     UTF16ToCurrentMacMBCSEncoding(reinterpret_cast<const unsigned short*>(s.utf16()),
