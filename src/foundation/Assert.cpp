@@ -1,6 +1,8 @@
 // The assertion dialog and the host's fatal-error dialog.
 #include <Velmar/Diagnostics.h>
 
+#include <Velmar/CarbonEventHandlers.h>
+
 #include "foundation/DiagnosticsPrivate.h"
 #include "platform/Platform.h"
 
@@ -102,6 +104,8 @@ void velmar_assert(const char* expression, const char* file, int line, const cha
 
     AssertChoice choice;
     {
+        // No Carbon handler or event loop timer may run while the developer decides.
+        ScopedCarbonEventsBlocker blocker("velmar_assert");
         choice = runAssertDialog(text);
         if (choice == AssertChoice::IgnoreAll)
             ignoredLocations().insert(key);

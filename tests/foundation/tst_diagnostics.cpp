@@ -3,6 +3,7 @@
 
 #include <Velmar/Diagnostics.h>
 
+#include "events/EventQueue.h"
 #include "foundation/DiagnosticsPrivate.h"
 #include "foundation/MessageHandler.h"
 
@@ -188,6 +189,20 @@ private Q_SLOTS:
         // Plain "Ignore" asks again next time.
         assertAt(41);
         QCOMPARE(listener.count(), 4);
+    }
+
+    void carbonEventsBlockedWhileAsking()
+    {
+        VelmarTest::ScriptedAutomationListener listener;
+        bool blockedDuringDialog = false;
+        listener.setResponder([&](const VelmarTest::ScriptedAutomationListener::Question&) {
+            blockedDuringDialog = Private::MainEventQueue()->CheckCarbonEventsDisabled();
+            return QStringLiteral("Ignore");
+        });
+        QVERIFY(!Private::MainEventQueue()->CheckCarbonEventsDisabled());
+        assertAt(70);
+        QVERIFY(blockedDuringDialog);
+        QVERIFY(!Private::MainEventQueue()->CheckCarbonEventsDisabled());
     }
 
     void assertionsNeverNest()
