@@ -1,6 +1,7 @@
 // Memory handles: a master pointer at the head of a block that also records the size.
-#include <Velmar/Diagnostics.h>
 #include <Velmar/HostCore.h>
+
+#include <QtGlobal>
 
 #include <cstddef>
 #include <cstdlib>
@@ -26,7 +27,7 @@ public:
     Handle PtrToHand(const void* data, Size size) override
     {
         if (size < 0 || size > kMaxHandleSize) {
-            VelmarLog(kLogUnknown, "TxPtrToHand: refused size %d", int(size));
+            qWarning("TxPtrToHand: refused size %d", int(size));
             return nullptr;
         }
         void* memory = std::malloc(sizeof(Block) + size_t(size) + 1);
@@ -50,7 +51,7 @@ public:
         if (!handle)
             return;
         if (m_live.erase(handle) == 0) {
-            VelmarLog(kLogUnknown, "TxDisposeHandle: not a live handle %p", static_cast<void*>(handle));
+            qWarning("TxDisposeHandle: not a live handle %p", static_cast<void*>(handle));
             return;
         }
         Block* block = blockOf(handle);
@@ -62,7 +63,7 @@ public:
     {
         if (!IsValidHandle(handle)) {
             if (handle)
-                VelmarLog(kLogUnknown, "TxCopyHand: not a live handle %p", static_cast<void*>(handle));
+                qWarning("TxCopyHand: not a live handle %p", static_cast<void*>(handle));
             return nullptr;
         }
         const Block* block = blockOf(handle);

@@ -1,6 +1,7 @@
 // The localised text table: untranslated keys stand for themselves.
-#include <Velmar/Diagnostics.h>
 #include <Velmar/HostCore.h>
+
+#include <QtGlobal>
 
 #include <QFile>
 #include <QHash>
@@ -65,13 +66,13 @@ bool TextTable::LoadJsonFile(const QString& path)
 {
     QFile file(path);
     if (!file.open(QIODevice::ReadOnly)) {
-        VelmarLog(kLogUnknown, "TextTable: cannot open %s", qPrintable(path));
+        qWarning("TextTable: cannot open %s", qPrintable(path));
         return false;
     }
     QJsonParseError error;
     const QJsonDocument document = QJsonDocument::fromJson(file.readAll(), &error);
     if (error.error != QJsonParseError::NoError || !document.isObject()) {
-        VelmarLog(kLogUnknown, "TextTable: %s is not a JSON object of texts", qPrintable(path));
+        qWarning("TextTable: %s is not a JSON object of texts", qPrintable(path));
         return false;
     }
     const QJsonObject object = document.object();

@@ -1,0 +1,154 @@
+// The X11 backend against a real server: keys and buttons pressed through the XTEST
+// extension (libXtst is loaded at run time when present; no build dependency).
+#include "TestSupport.h"
+
+#include "platform/Platform.h"
+#include "platform/VirtualKeys.h"
+
+#include <QGuiApplication>
+
+#if defined(Q_OS_UNIX)
+#include <dlfcn.h>
+#endif
+
+using namespace Velmar::Private;
+namespace VK = Velmar::Private::VirtualKey;
+
+namespace {
+
+struct Display;
+
+// Just the Xlib and XTEST entry points the test needs, resolved at run time.
+struct XTest {
+    int (*fakeKey)(Display*, unsigned, int, unsigned long) = nullptr;
+    int (*fakeButton)(Display*, unsigned, int, unsigned long) = nullptr;
+    unsigned char (*keysymToKeycode)(Display*, unsigned long) = nullptr;
+    int (*sync)(Display*, int) = nullptr;
+    Display* display = nullptr;
+
+    bool load()
+    {
+#if QT_CONFIG(xcb) && defined(Q_OS_UNIX)
+        auto* x11 = qApp->nativeInterface<QNativeInterface::QX11Application>();
+        display = x11 ? reinterpret_cast<Display*>(x11->display()) : nullptr;
+        void* xtst = dlopen("libXtst.so.6", RTLD_NOW | RTLD_LOCAL);
+        void* xlib = dlopen("libX11.so.6", RTLD_NOW | RTLD_LOCAL);
+        if (!display || !xtst || !xlib)
+            return false;
+        fakeKey = reinterpret_cast<decltype(fakeKey)>(dlsym(xtst, "XTestFakeKeyEvent"));
+        fakeButton = reinterpret_cast<decltype(fakeButton)>(dlsym(xtst, "XTestFakeButtonEvent"));
+        keysymToKeycode = reinterpret_cast<decltype(keysymToKeycode)>(dlsym(xlib, "XKeysymToKeycode"));
+        sync = reinterpret_cast<decltype(sync)>(dlsym(xlib, "XSync"));
+        return fakeKey && fakeButton && keysymToKeycode && sync;
+#else
+        return false;
+#endif
+    }
+
+    void key(unsigned long keysym, bool press)
+    {
+        fakeKey(display, keysymToKeycode(display, keysym), press ? 1 : 0, 0);
+        sync(display, 0);
+    }
+
+    void button(unsigned button, bool press)
+    {
+        fakeButton(display, button, press ? 1 : 0, 0);
+        sync(display, 0);
+    }
+};
+
+} // namespace
+
+class X11InputTest : public QObject {
+    Q_OBJECT
+private Q_SLOTS:
+    void initTestCase();
+    void cleanup();
+    void keys_data();
+    void keys();
+    void capsLockToggles();
+    void leftButton();
+
+private:
+    XTest m_xtest;
+};
+
+void X11InputTest::initTestCase()
+{
+    if (QGuiApplication::platformName() != QLatin1String("xcb"))
+        QSKIP("needs an X display");
+    if (!m_xtest.load())
+        QSKIP("XTEST (libXtst.so.6) not available");
+    Platform::setWindowSystemInputEnabled(true);
+}
+
+void X11InputTest::cleanup()
+{
+    // Never leave a key or button held on the display, whatever failed.
+    for (unsigned long keysym : {0x61ul, 0x35ul, 0xffe1ul, 0xffe4ul, 0xffbful, 0xff52ul})
+        m_xtest.key(keysym, false);
+    m_xtest.button(1, false);
+}
+
+void X11InputTest::keys_data()
+{
+    QTest::addColumn<qulonglong>("keysym");
+    QTest::addColumn<int>("vk");
+    QTest::addColumn<int>("genericVk");
+    QTest::newRow("a") << 0x61ull << int(VK::A) << 0;
+    QTest::newRow("5") << 0x35ull << VK::Digit0 + 5 << 0;
+    QTest::newRow("F2") << 0xffbfull << VK::F1 + 1 << 0;
+    QTest::newRow("Up") << 0xff52ull << int(VK::Up) << 0;
+    QTest::newRow("Shift_L") << 0xffe1ull << int(VK::LShift) << int(VK::Shift);
+    QTest::newRow("Control_R") << 0xffe4ull << int(VK::RControl) << int(VK::Control);
+}
+
+void X11InputTest::keys()
+{
+    QFETCH(qulonglong, keysym);
+    QFETCH(int, vk);
+    QFETCH(int, genericVk);
+    QVERIFY(!Platform::isAsyncKeyDown(vk));
+    m_xtest.key(keysym, true);
+    QVERIFY(Platform::isAsyncKeyDown(vk));
+    if (genericVk)
+        QVERIFY(Platform::isAsyncKeyDown(genericVk));
+    Velmar::UInt8 state[256];
+    Platform::getKeyboardState(state);
+    QCOMPARE(int(state[vk] & 0x80), 0x80);
+    int down = 0;
+    for (int i = 0; i < 256; ++i)
+        down += (state[i] & 0x80) ? 1 : 0;
+    QCOMPARE(down, genericVk ? 2 : 1);
+    m_xtest.key(keysym, false);
+    QVERIFY(!Platform::isAsyncKeyDown(vk));
+}
+
+void X11InputTest::capsLockToggles()
+{
+    const bool before = Platform::isCapsLockToggled();
+    m_xtest.key(0xffe5, true);
+    m_xtest.key(0xffe5, false);
+    QCOMPARE(Platform::isCapsLockToggled(), !before);
+    Velmar::UInt8 state[256];
+    Platform::getKeyboardState(state);
+    QCOMPARE(int(state[VK::Capital] & 0x01), before ? 0 : 1);
+    m_xtest.key(0xffe5, true);
+    m_xtest.key(0xffe5, false);
+    QCOMPARE(Platform::isCapsLockToggled(), before);
+}
+
+void X11InputTest::leftButton()
+{
+    QVERIFY(!Platform::isSystemLeftButtonDown());
+    m_xtest.button(1, true);
+    QVERIFY(Platform::isSystemLeftButtonDown());
+    QVERIFY(Platform::isAsyncKeyDown(VK::LButton));
+    QVERIFY(!Platform::isAsyncKeyDown(VK::RButton));
+    m_xtest.button(1, false);
+    QVERIFY(!Platform::isSystemLeftButtonDown());
+}
+
+VELMAR_TEST_MAIN(X11InputTest)
+#include "tst_x11input.moc"
