@@ -1,6 +1,7 @@
 // Shared helpers for the QtTest executables.
 #pragma once
 
+#include <Velmar/Application.h>
 #include <Velmar/HostCore.h>
 
 #include <QStringList>
@@ -97,6 +98,18 @@ void isolateSettings();
     {                                                                                       \
         VelmarTest::isolateSettings();                                                      \
         QApplication app(argc, argv);                                                       \
+        TestObject tc;                                                                      \
+        QTEST_SET_MAIN_SOURCE_PATH                                                          \
+        return QTest::qExec(&tc, argc, argv);                                               \
+    }
+
+// The same under the library's application object (not decorated), for tests of code that
+// needs AQtApplication::instance().
+#define VELMAR_APP_TEST_MAIN(TestObject)                                                    \
+    int main(int argc, char** argv)                                                         \
+    {                                                                                       \
+        VelmarTest::isolateSettings();                                                      \
+        Velmar::AQtApplication app(argc, argv, false);                                      \
         TestObject tc;                                                                      \
         QTEST_SET_MAIN_SOURCE_PATH                                                          \
         return QTest::qExec(&tc, argc, argv);                                               \

@@ -1,0 +1,424 @@
+// The application object: construction, the notify filter (exceptions, tablets, timers,
+// Control key, activation), activation events, menu slots and the native message hook.
+#include "TestSupport.h"
+
+#include <Velmar/Application.h>
+#include <Velmar/CarbonEventHandlers.h>
+#include <Velmar/HostCore.h>
+#include <Velmar/HostShell.h>
+
+#include "events/EventQueue.h"
+#include "foundation/ApplicationPrivate.h"
+
+#include <QAbstractEventDispatcher>
+#include <QMenu>
+#include <QMenuBar>
+#include <QPointingDevice>
+#include <QStyle>
+#include <QTabletEvent>
+
+#include <functional>
+#include <stdexcept>
+
+using namespace Velmar;
+using Private::EventQueueItem;
+using Private::MainEventQueue;
+
+namespace {
+
+int queuedCount(UInt32 eventClass, UInt32 eventKind)
+{
+    int n = 0;
+    for (const auto& item : MainEventQueue()->items())
+        n += item->isClass(eventClass, eventKind) ? 1 : 0;
+    return n;
+}
+
+const EventQueueItem* lastQueued()
+{
+    return MainEventQueue()->isEmpty() ? nullptr : MainEventQueue()->items().back().get();
+}
+
+class Thrower : public QObject {
+public:
+    std::function<void()> throwIt;
+    bool event(QEvent* e) override
+    {
+        if (e->type() == QEvent::User)
+            throwIt();
+        return QObject::event(e);
+    }
+};
+
+class EventCounter : public QWidget {
+public:
+    QList<int> timerIds;
+    int tabletEvents = 0;
+
+protected:
+    void timerEvent(QTimerEvent* e) override { timerIds.append(e->timerId()); }
+    bool event(QEvent* e) override
+    {
+        switch (e->type()) {
+        case QEvent::TabletMove:
+        case QEvent::TabletPress:
+        case QEvent::TabletRelease:
+        case QEvent::TabletEnterProximity:
+        case QEvent::TabletLeaveProximity:
+            ++tabletEvents;
+            break;
+        default:
+            break;
+        }
+        return QWidget::event(e);
+    }
+};
+
+int gInitCursorCalls = 0;
+QList<QAction*> gRecordedChoices;
+QList<QMenu*> gRefreshed;
+
+int gHookCalls = 0;
+void* gHookMessage = nullptr;
+bool consumingHook(void* message, SInt32* result)
+{
+    ++gHookCalls;
+    gHookMessage = message;
+    *result = 42;
+    return true;
+}
+bool passingHook(void*, SInt32*)
+{
+    ++gHookCalls;
+    return false;
+}
+
+} // namespace
+
+class TestApplication : public QObject {
+    Q_OBJECT
+
+    // Any assertion raised here is answered, never shown.
+    VelmarTest::ScriptedAutomationListener m_listener{{}, QStringLiteral("Ignore")};
+    AQtApplication* app() { return AQtApplication::instance(); }
+
+private Q_SLOTS:
+    void initTestCase()
+    {
+        Private::ApplicationHooks hooks;
+        hooks.initCursor = [] { ++gInitCursorCalls; };
+        hooks.recordMenuChoice = [](QAction* a) { gRecordedChoices.append(a); };
+        hooks.refreshMenu = [](QMenu* m) { gRefreshed.append(m); };
+        Private::SetApplicationHooks(hooks);
+    }
+
+    void init()
+    {
+        MainEventQueue()->clearAll();
+        app()->setProperty(PopupMenuIsExecuting, QVariant());
+        gRecordedChoices.clear();
+        gRefreshed.clear();
+    }
+
+    void construction()
+    {
+        QVERIFY(app());
+        QCOMPARE(app()->metaObject()->className(), "Velmar::AQtApplication");
+        QVERIFY(app()->menuBar());
+        QVERIFY(!app()->menuBar()->parent());
+        QCOMPARE(QApplication::style()->name().toLower(), QStringLiteral("windows"));
+        QVERIFY(QApplication::windowIcon().pixmap(16, 16).isNull()); // no default icon
+        QVERIFY(Brindle::DecorationManager::Instance());
+        QCOMPARE(Brindle::DecorationManager::Instance()->MdiMode(),
+                 int(Brindle::DecorationManager::kMdiNative));
+        QCOMPARE(Brindle::DecorationManager::Instance()->MenuBar(), app()->menuBar());
+        QVERIFY(!Private::inspectorEnabled());
+        QVERIFY(!app()->hasReceivedApplicationActivate());
+        QVERIFY(!app()->AnyButtonStillDown());
+    }
+
+    void exceptionGuard_data()
+    {
+        QTest::addColumn<int>("kind");
+        QTest::addColumn<QString>("second");
+        QTest::newRow("char*") << 0 << QStringLiteral("boom");
+        QTest::newRow("null char*") << 1 << QStringLiteral("NULL char* caught!");
+        QTest::newRow("result code") << 2 << QStringLiteral("Unhandled result code exception (-4)!");
+        QTest::newRow("result code hex") << 3 << QStringLiteral("Unhandled result code exception (1a2b)!");
+        QTest::newRow("XError") << 4 << QStringLiteral("   Error: disk gone Line: 12 File: Save.cpp");
+        QTest::newRow("QString") << 5 << QStringLiteral("from a QString");
+        QTest::newRow("std::exception") << 6 << QStringLiteral("runtime trouble");
+        QTest::newRow("other") << 7 << QStringLiteral("Unknown exception occurred!");
+        QTest::newRow("long") << 8 << QStringLiteral("Unhandled result code exception (-15e0)!");
+    }
+
+    void exceptionGuard()
+    {
+        QFETCH(int, kind);
+        QFETCH(QString, second);
+        Thrower thrower;
+        thrower.throwIt = [kind] {
+            switch (kind) {
+            case 0: throw "boom";
+            case 1: throw static_cast<char*>(nullptr);
+            case 2: throw SInt32(-4);
+            case 3: throw SInt32(0x1a2b);
+            case 4: throw XError("io", "disk gone", 12, "Save.cpp");
+            case 5: throw QStringLiteral("from a QString");
+            case 6: throw std::runtime_error("runtime trouble");
+            case 7: throw 2.5;
+            default: throw -5600L;
+            }
+        };
+        VelmarTest::LogCapture log;
+        QEvent e(QEvent::User);
+        QCOMPARE(QCoreApplication::sendEvent(&thrower, &e), false);
+        QCOMPARE(log.lines().size(), 2);
+        QVERIFY(log.lines().at(0).endsWith(QStringLiteral(
+            "[CRITICAL]: AQtApplication::notify() - an exception occurred processing events.\n")));
+        QVERIFY2(log.lines().at(1).endsWith(QStringLiteral("[CRITICAL]: ") + second + u'\n'),
+                 qPrintable(log.lines().at(1)));
+    }
+
+    void tabletEventsNeverDelivered_data()
+    {
+        QTest::addColumn<int>("type");
+        QTest::newRow("move") << int(QEvent::TabletMove);
+        QTest::newRow("press") << int(QEvent::TabletPress);
+        QTest::newRow("release") << int(QEvent::TabletRelease);
+        QTest::newRow("enter proximity") << int(QEvent::TabletEnterProximity);
+        QTest::newRow("leave proximity") << int(QEvent::TabletLeaveProximity);
+    }
+
+    void tabletEventsNeverDelivered()
+    {
+        QFETCH(int, type);
+        EventCounter widget;
+        QTabletEvent e(QEvent::Type(type), QPointingDevice::primaryPointingDevice(),
+                       QPointF(5, 5), QPointF(5, 5), 0.5, 0, 0, 0, 0, 0, Qt::NoModifier,
+                       Qt::LeftButton, Qt::LeftButton);
+        QCOMPARE(QCoreApplication::sendEvent(&widget, &e), false);
+        QVERIFY(!e.isAccepted());
+        QCOMPARE(widget.tabletEvents, 0);
+    }
+
+    void timersPostponedWhileBlocked()
+    {
+        EventCounter receiver;
+        auto* doomed = new EventCounter;
+        {
+            ScopedCarbonEventsBlocker blocker("test");
+            QVERIFY(app()->CheckAppleEventHandlersDisabled());
+            // A repeating timer firing three times, then a second one, then one whose
+            // receiver goes away before the blocking ends.
+            for (int id : {501, 501, 502, 501}) {
+                QTimerEvent e(id);
+                QCOMPARE(QCoreApplication::sendEvent(&receiver, &e), true);
+            }
+            QTimerEvent lost(503);
+            QCoreApplication::sendEvent(doomed, &lost);
+            delete doomed;
+            QVERIFY(receiver.timerIds.isEmpty());
+        }
+        QVERIFY(!app()->CheckAppleEventHandlersDisabled());
+        app()->DispatchPostponedTimers();
+        QCoreApplication::sendPostedEvents();
+        QCOMPARE(receiver.timerIds, (QList<int>{501, 502}));
+
+        // Nothing is left over for the next unblocking.
+        app()->DispatchPostponedTimers();
+        QCoreApplication::sendPostedEvents();
+        QCOMPARE(receiver.timerIds.size(), 2);
+
+        // Unblocked, timers are delivered as usual.
+        QTimerEvent direct(504);
+        QCoreApplication::sendEvent(&receiver, &direct);
+        QCOMPARE(receiver.timerIds.last(), 504);
+    }
+
+    void realSingleShotSurvivesBlocking()
+    {
+        int fired = 0;
+        {
+            ScopedCarbonEventsBlocker blocker("test");
+            QTimer::singleShot(5, [&fired] { ++fired; });
+            QTest::qWait(60);
+            QCOMPARE(fired, 0);
+        }
+        app()->DispatchPostponedTimers();
+        QTRY_COMPARE(fired, 1);
+        QTest::qWait(30);
+        QCOMPARE(fired, 1);
+    }
+
+    void controlKeyUpdatesMenus()
+    {
+        QWidget widget;
+        widget.show();
+        QTest::keyPress(&widget, Qt::Key_Control);
+        QTest::keyRelease(&widget, Qt::Key_Control);
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 1);
+        // A shortcut presses Control first (one update), then the letter (none).
+        QTest::keyClick(&widget, Qt::Key_A, Qt::ControlModifier);
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 2);
+        QTest::keyClick(&widget, Qt::Key_A);
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 2);
+
+        // From the window system, a press reaches the window first and then the widget:
+        // still one update per press.
+        QVERIFY(QTest::qWaitForWindowExposed(&widget));
+        QTest::keyPress(widget.windowHandle(), Qt::Key_Control);
+        QTest::keyRelease(widget.windowHandle(), Qt::Key_Control);
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 3);
+        QVERIFY(gRefreshed.isEmpty()); // no menu to refresh when the key asks
+
+        // Not while Carbon events are blocked.
+        ScopedCarbonEventsBlocker blocker("test");
+        QTest::keyPress(&widget, Qt::Key_Control);
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 3);
+        QTest::keyRelease(&widget, Qt::Key_Control);
+    }
+
+    void controlKeyClosesRunningPopup()
+    {
+        QWidget widget;
+        widget.show();
+        QMenu popup;
+        popup.addAction(QStringLiteral("One"));
+        popup.popup(QPoint(10, 10));
+        app()->setProperty(PopupMenuIsExecuting, QVariant::fromValue<QWidget*>(&popup));
+        QTest::keyPress(&widget, Qt::Key_Control);
+        QVERIFY(!popup.isVisible());
+        QVERIFY(!app()->property(PopupMenuIsExecuting).isValid());
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 1);
+    }
+
+    void menuAboutToShowWithPopup()
+    {
+        QMenu popup;
+        QMenu* submenu = popup.addMenu(QStringLiteral("Sub"));
+        QMenu barMenu(QStringLiteral("File"));
+        app()->menuBar()->addMenu(&barMenu);
+        for (QMenu* m : {&popup, submenu, &barMenu})
+            connect(m, &QMenu::aboutToShow, app(), &AQtApplication::onMenuAboutToShow);
+        app()->setProperty(PopupMenuIsExecuting, QVariant::fromValue<QWidget*>(&popup));
+
+        // The pop-up itself and its submenus open without posting.
+        Q_EMIT popup.aboutToShow();
+        Q_EMIT submenu->aboutToShow();
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 0);
+        QVERIFY(app()->property(PopupMenuIsExecuting).isValid());
+        QCOMPARE(gRefreshed, (QList<QMenu*>{&popup, submenu}));
+
+        // A menu-bar menu ends the pop-up and posts.
+        Q_EMIT barMenu.aboutToShow();
+        QVERIFY(!app()->property(PopupMenuIsExecuting).isValid());
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarUpdateMenus), 1);
+        app()->menuBar()->removeAction(barMenu.menuAction());
+    }
+
+    void menuBarTriggered()
+    {
+        QAction action(QStringLiteral("Open"));
+        QMenu popup;
+        app()->setProperty(PopupMenuIsExecuting, QVariant::fromValue<QWidget*>(&popup));
+        app()->onMenuBarTriggered(&action);
+        QCOMPARE(MainEventQueue()->count(), 0u);
+        QVERIFY(gRecordedChoices.isEmpty());
+
+        app()->setProperty(PopupMenuIsExecuting, QVariant());
+        connect(&action, &QAction::triggered, app(), &AQtApplication::onMenuItemTriggered);
+        action.trigger();
+        QCOMPARE(gRecordedChoices, (QList<QAction*>{&action}));
+        QCOMPARE(queuedCount(Private::kEventClassVelmar, Private::kEventVelmarMenuTriggered), 1);
+        QVERIFY(lastQueued()->when > 0 || TickCount() == 0);
+    }
+
+    void menuItemTriggeredNeedsAnAction()
+    {
+        QMenu notAnAction;
+        connect(&notAnAction, &QMenu::aboutToHide, app(), &AQtApplication::onMenuItemTriggered);
+        const int asked = m_listener.count();
+        Q_EMIT notAnAction.aboutToHide();
+        QCOMPARE(m_listener.count(), asked + 1);
+        QVERIFY(m_listener.questions().last().text.startsWith(QStringLiteral("velmar_assert: action\n")));
+        QCOMPARE(MainEventQueue()->count(), 0u);
+    }
+
+    void applicationActivation()
+    {
+        QEvent activate(QEvent::ApplicationActivate);
+        QCoreApplication::sendEvent(app(), &activate);
+        QVERIFY(app()->hasReceivedApplicationActivate());
+        QVERIFY(lastQueued());
+        QVERIFY(lastQueued()->isClass(kEventClassApplication, kEventAppActivated));
+
+        QEvent deactivate(QEvent::ApplicationDeactivate);
+        QCoreApplication::sendEvent(app(), &deactivate);
+        QVERIFY(!app()->hasReceivedApplicationActivate());
+        QVERIFY(lastQueued()->isClass(kEventClassApplication, kEventAppDeactivated));
+        QCOMPARE(MainEventQueue()->count(), 2u);
+    }
+
+    void windowActivationSetsCursor()
+    {
+        QWidget widget;
+        const int before = gInitCursorCalls;
+        QEvent activate(QEvent::WindowActivate);
+        QCoreApplication::sendEvent(&widget, &activate);
+        QEvent deactivate(QEvent::WindowDeactivate);
+        QCoreApplication::sendEvent(&widget, &deactivate);
+        QCOMPARE(gInitCursorCalls, before + 2);
+    }
+
+    void nativeMessageHook()
+    {
+        int message = 0;
+        SInt32 result = 0;
+        QVERIFY(!app()->winEventFilter(&message, &result));
+
+        // Through Qt's native filter chain, as the window system's messages arrive.
+        auto* dispatcher = QAbstractEventDispatcher::instance();
+        qintptr qtResult = 0;
+        gHookCalls = 0;
+        app()->SetWinEventHandler(&passingHook);
+        QVERIFY(!dispatcher->filterNativeEvent("velmar_test", &message, &qtResult));
+        QCOMPARE(gHookCalls, 1);
+
+        app()->SetWinEventHandler(&consumingHook);
+        QVERIFY(dispatcher->filterNativeEvent("velmar_test", &message, &qtResult));
+        QCOMPARE(gHookMessage, static_cast<void*>(&message));
+        QCOMPARE(qtResult, qintptr(42));
+
+        app()->SetWinEventHandler(nullptr);
+        QVERIFY(!dispatcher->filterNativeEvent("velmar_test", &message, &qtResult));
+        QCOMPARE(gHookCalls, 2);
+    }
+
+    void buttonState()
+    {
+        QWidget widget;
+        widget.resize(100, 100);
+        widget.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&widget));
+        QTest::mousePress(&widget, Qt::RightButton, {}, QPoint(10, 10));
+        QVERIFY(app()->RightButtonStillDown());
+        QVERIFY(app()->AnyButtonStillDown());
+        QVERIFY(!app()->LeftButtonStillDown());
+        QVERIFY(!app()->MiddleButtonStillDown());
+        QTest::mouseRelease(&widget, Qt::RightButton, {}, QPoint(10, 10));
+        QVERIFY(!app()->AnyButtonStillDown());
+    }
+
+    // Last: it asks the event loop to quit.
+    void shutdownRemovesDecorations()
+    {
+        QVERIFY(Brindle::DecorationManager::Instance());
+        app()->ShutdownApp();
+        QVERIFY(!Brindle::DecorationManager::Instance());
+        app()->ShutdownApp(); // twice is harmless
+    }
+};
+
+VELMAR_APP_TEST_MAIN(TestApplication)
+#include "tst_application.moc"
