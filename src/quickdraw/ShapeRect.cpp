@@ -60,7 +60,18 @@ void FrameRect(const Rect* r)
     } else {
         const QBrush own = painter->brush();
         painter->setBrush(Qt::NoBrush);
-        painter->drawRect(stroke);
+        if (w > 1 && pen.joinStyle() != Qt::MiterJoin) {
+            // Square outer corners, so that a wide frame is the full band a Toolbox frame is
+            // (the normal pen's bevel join would cut the corner pixels off).
+            const QPen ownPen = pen;
+            QPen square = pen;
+            square.setJoinStyle(Qt::MiterJoin);
+            painter->setPen(square);
+            painter->drawRect(stroke);
+            painter->setPen(ownPen);
+        } else {
+            painter->drawRect(stroke);
+        }
         painter->setBrush(own);
     }
     painter |= q;
