@@ -1,6 +1,8 @@
 // The classic debugger calls and the optional stack logger.
 #include <Velmar/Diagnostics.h>
 
+#include <Velmar/TextUtils.h>
+
 #include "foundation/DiagnosticsPrivate.h"
 #include "platform/Platform.h"
 
@@ -15,18 +17,11 @@ namespace {
 
 void* gStackLogTo = nullptr;
 
-QString pascalToQString(ConstStr255Param p)
-{
-    if (!p || p[0] == 0)
-        return QString();
-    return QString::fromLocal8Bit(reinterpret_cast<const char*>(p + 1), p[0]);
-}
-
 } // namespace
 
 void DebugStr(ConstStr255Param message)
 {
-    qDebug("%s", qPrintable(pascalToQString(message)));
+    qDebug("%s", qPrintable(PascalString2QString(message)));
 }
 
 void Debugger()
