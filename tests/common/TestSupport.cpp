@@ -68,32 +68,48 @@ QString ScriptedAutomationListener::AnswerDialog(const QString& title, const QSt
 
 ModalActor::ModalActor(std::function<void(QWidget* modal)> act)
     : m_act(std::move(act))
-    , m_timer(new QTimer)
+    , m_context(new QObject)
+    , m_thread(new QThread)
 {
-    // Polled from inside the modal loop; gives up after ~5 s, closing whatever is modal.
-    m_timer->setInterval(20);
-    QObject::connect(m_timer, &QTimer::timeout, m_timer, [this]() {
-        QWidget* modal = QApplication::activeModalWidget();
-        if (modal && !m_acted) {
-            m_acted = true;
-            m_act(modal);
-            modal = QApplication::activeModalWidget();
-        }
-        const bool givingUp = ++m_attempts > 250;
-        if (modal && (m_acted || givingUp)) {
-            if (auto* dialog = qobject_cast<QDialog*>(modal))
-                dialog->reject();
-            modal->close();
-        }
-        if (m_acted || givingUp)
-            m_timer->stop();
-    });
-    m_timer->start();
+    // The clock ticks in its own thread and calls back through queued calls: the
+    // application postpones GUI-thread timers while Carbon events are blocked (as they are
+    // under an assertion box), but never posted calls.
+    auto* timer = new QTimer;
+    timer->setInterval(20);
+    timer->moveToThread(m_thread);
+    QObject::connect(m_thread, &QThread::started, timer, qOverload<>(&QTimer::start));
+    QObject::connect(m_thread, &QThread::finished, timer, &QObject::deleteLater);
+    QObject::connect(timer, &QTimer::timeout, m_context, [this] { poll(); },
+                     Qt::QueuedConnection);
+    m_thread->start();
 }
 
 ModalActor::~ModalActor()
 {
-    delete m_timer;
+    m_thread->quit();
+    m_thread->wait();
+    delete m_thread;
+    delete m_context; // drops calls still queued
+}
+
+void ModalActor::poll()
+{
+    if (m_done)
+        return;
+    // Gives up after ~5 s, closing whatever is modal, so that no test hangs on a box.
+    QWidget* modal = QApplication::activeModalWidget();
+    if (modal && !m_acted) {
+        m_acted = true;
+        m_act(modal);
+        modal = QApplication::activeModalWidget();
+    }
+    const bool givingUp = ++m_attempts > 250;
+    if (modal && (m_acted || givingUp)) {
+        if (auto* dialog = qobject_cast<QDialog*>(modal))
+            dialog->reject();
+        modal->close();
+    }
+    m_done = m_acted || givingUp;
 }
 
 void isolateSettings()

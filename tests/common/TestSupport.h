@@ -6,6 +6,7 @@
 
 #include <QStringList>
 #include <QTemporaryDir>
+#include <QThread>
 #include <QTimer>
 #include <QtTest>
 
@@ -80,9 +81,13 @@ public:
     bool acted() const { return m_acted; }
 
 private:
+    void poll();
+
     std::function<void(QWidget*)> m_act;
-    QTimer* m_timer;
+    QObject* m_context;
+    QThread* m_thread;
     bool m_acted = false;
+    bool m_done = false;
     int m_attempts = 0;
 };
 

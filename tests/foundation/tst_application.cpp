@@ -4,6 +4,7 @@
 
 #include <Velmar/Application.h>
 #include <Velmar/CarbonEventHandlers.h>
+#include <Velmar/Diagnostics.h>
 #include <Velmar/HostCore.h>
 #include <Velmar/HostShell.h>
 
@@ -13,6 +14,8 @@
 #include <QAbstractEventDispatcher>
 #include <QMenu>
 #include <QMenuBar>
+#include <QMessageBox>
+#include <QPushButton>
 #include <QPointingDevice>
 #include <QStyle>
 #include <QTabletEvent>
@@ -343,6 +346,32 @@ private Q_SLOTS:
         QCOMPARE(m_listener.count(), asked + 1);
         QVERIFY(m_listener.questions().last().text.startsWith(QStringLiteral("velmar_assert: action\n")));
         QCOMPARE(MainEventQueue()->count(), 0u);
+    }
+
+    void realAssertBoxBlocksCarbonEvents()
+    {
+        // No listener: the real box shows, Carbon events and GUI timers wait meanwhile.
+        AutomationListener* previous = AutomationListenerManager::SetListener(nullptr);
+        EventCounter receiver;
+        bool blockedDuringBox = false;
+        {
+            VelmarTest::ModalActor actor([&](QWidget* modal) {
+                blockedDuringBox = app()->CheckAppleEventHandlersDisabled();
+                QTimerEvent e(601);
+                QCoreApplication::sendEvent(&receiver, &e);
+                if (auto* box = qobject_cast<QMessageBox*>(modal))
+                    box->button(QMessageBox::Ignore)->click();
+            });
+            velmar_assert("false", "Box.cpp", 1, "realAssertBox", "shown for real");
+            QVERIFY(actor.acted());
+        }
+        AutomationListenerManager::SetListener(previous);
+        QVERIFY(blockedDuringBox);
+        QVERIFY(receiver.timerIds.isEmpty());
+        QVERIFY(!app()->CheckAppleEventHandlersDisabled());
+        app()->DispatchPostponedTimers();
+        QCoreApplication::sendPostedEvents(&receiver);
+        QCOMPARE(receiver.timerIds, QList<int>{601});
     }
 
     void applicationActivation()

@@ -8,6 +8,7 @@
 #include "foundation/MessageHandler.h"
 
 #include <QMessageBox>
+#include <QProcess>
 #include <QPushButton>
 #include <QRegularExpression>
 
@@ -99,6 +100,31 @@ private Q_SLOTS:
             QStringLiteral("^\\[ *\\d+\\.\\d{3}\\]\\[WARNING\\]: handler 42\\n$"));
         QVERIFY2(warning.match(log.lines().at(0)).hasMatch(), qPrintable(log.lines().at(0)));
         QVERIFY(log.lines().at(1).contains(QStringLiteral("][UNKNOWN]: informative")));
+    }
+
+    // Run by fatalMessageAborts in a child process only.
+    void fatalChild()
+    {
+        if (qEnvironmentVariableIsEmpty("VELMAR_FATAL_CHILD"))
+            QSKIP("only as the child process of fatalMessageAborts");
+        Private::installMessageHandler();
+        qFatal("dying now");
+    }
+
+    void fatalMessageAborts()
+    {
+#ifdef Q_OS_WIN
+        QSKIP("the line goes to the debugger, not to standard error");
+#endif
+        QProcess child;
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("VELMAR_FATAL_CHILD"), QStringLiteral("1"));
+        child.setProcessEnvironment(env);
+        child.start(QCoreApplication::applicationFilePath(), {QStringLiteral("fatalChild")});
+        QVERIFY(child.waitForFinished(60000));
+        QCOMPARE(child.exitStatus(), QProcess::CrashExit);
+        const QString err = QString::fromLocal8Bit(child.readAllStandardError());
+        QVERIFY2(err.contains(QStringLiteral("][FATAL]: dying now\n")), qPrintable(err));
     }
 
     void categoryNames()
