@@ -13,6 +13,7 @@
 #include <QPushButton>
 #include <QSet>
 #include <QStringList>
+#include <QThread>
 
 #include <array>
 #include <cstdlib>
@@ -33,9 +34,11 @@ QMutex gAssertMutex;
 
 enum class AssertChoice { Abort, Retry, Ignore, IgnoreAll };
 
+// Boxes need the widget application and its thread; elsewhere the answer is "go on".
 bool canShowWidgets()
 {
-    return qobject_cast<QApplication*>(QCoreApplication::instance()) != nullptr;
+    QCoreApplication* app = QCoreApplication::instance();
+    return qobject_cast<QApplication*>(app) && app->thread() == QThread::currentThread();
 }
 
 AssertChoice runAssertDialog(const QString& text)

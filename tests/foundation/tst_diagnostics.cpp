@@ -9,6 +9,7 @@
 
 #include <QMessageBox>
 #include <QProcess>
+#include <QThread>
 #include <QPushButton>
 #include <QRegularExpression>
 
@@ -280,6 +281,18 @@ private Q_SLOTS:
         VelmarTest::ModalActor actor([](QWidget*) {});
         assertAt(120);
         QTest::qWait(100);
+        QVERIFY(!actor.acted());
+    }
+
+    void assertionOffTheGuiThreadShowsNoBox()
+    {
+        VelmarTest::LogCapture log;
+        VelmarTest::ModalActor actor([](QWidget*) {});
+        QThread* worker = QThread::create([] { assertAt(300, "worker"); });
+        worker->start();
+        QVERIFY(worker->wait(30000));
+        delete worker;
+        QVERIFY(log.contains(QStringLiteral("Location: Window.cpp:300 worker")));
         QVERIFY(!actor.acted());
     }
 
