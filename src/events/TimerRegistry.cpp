@@ -3,6 +3,8 @@
 #include "events/EventQueue.h"
 #include "events/EventLoopTimer.h"
 
+#include <Velmar/Application.h>
+
 #include <QCoreApplication>
 
 namespace Velmar::Private {
@@ -13,6 +15,8 @@ namespace {
 // application object; they go out again before the timers restart.
 void dispatchPostponedTimers()
 {
+    if (AQtApplication* app = AQtApplication::instance())
+        app->DispatchPostponedTimers();
 }
 
 } // namespace
