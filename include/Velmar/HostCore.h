@@ -36,7 +36,8 @@ VELMAR_EXPORT Handle TxCopyHand(Handle handle);
 VELMAR_EXPORT Size TxGetHandleSize(Handle handle); // -1 for anything not a live handle
 VELMAR_EXPORT bool TxIsValidHandle(Handle handle);
 
-// The allocator behind the calls above.
+// The allocator behind the calls above. Replace it before the first handle is made: each
+// allocator only knows its own handles.
 class VELMAR_EXPORT HandleAllocator {
 public:
     virtual ~HandleAllocator();

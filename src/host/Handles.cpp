@@ -92,8 +92,9 @@ private:
 
 DefaultHandleAllocator& defaultAllocator()
 {
-    static DefaultHandleAllocator allocator;
-    return allocator;
+    // Never destroyed: handles may still be disposed by other objects' destructors at exit.
+    static auto* allocator = new DefaultHandleAllocator;
+    return *allocator;
 }
 
 HandleAllocator* gAllocator = nullptr;

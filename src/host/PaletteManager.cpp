@@ -14,8 +14,8 @@ namespace {
 
 PaletteManager& defaultManager()
 {
-    static PaletteManager manager;
-    return manager;
+    static auto* manager = new PaletteManager; // never destroyed: usable until the process ends
+    return *manager;
 }
 
 PaletteManager* gManager = nullptr;

@@ -31,8 +31,8 @@ SInt16 styledMenuBarHeight()
 
 AScreenManOS& defaultManager()
 {
-    static AScreenManOS manager;
-    return manager;
+    static auto* manager = new AScreenManOS; // never destroyed: usable until the process ends
+    return *manager;
 }
 
 AScreenManOS* gManager = nullptr;

@@ -18,8 +18,8 @@ namespace {
 
 TextTable& defaultTable()
 {
-    static TextTable table;
-    return table;
+    static auto* table = new TextTable; // never destroyed: usable until the process ends
+    return *table;
 }
 
 TextTable* gTable = nullptr;

@@ -1,5 +1,8 @@
 // The one place that talks to the operating system or the window system directly.
-// Windows virtual-key codes stay the library's key vocabulary on every platform.
+// Windows virtual-key codes stay the library's key vocabulary on every platform: the codes
+// are named in platform/VirtualKeys.h, and platform/KeyTables.h turns Qt keys into them.
+// Backends: platform/windows (Win32) and platform/x11 (everything else; X11 through Qt's
+// xcb connection, Qt's own events where there is no X server).
 #pragma once
 
 #include <Velmar/MacTypes.h>
