@@ -1,6 +1,8 @@
 // The hooks through which the queue reaches windows and waiters.
 #include "events/EventQueueHooks.h"
 
+#include <Velmar/FeatureFlags.h>
+
 namespace Velmar::Private {
 
 namespace {
@@ -80,7 +82,7 @@ bool LegacyEventProcessing()
 {
     if (gWindowHooks.legacyEventProcessing)
         return gWindowHooks.legacyEventProcessing();
-    return true;
+    return SupportLegacyMacEventProcessing(kFeatureFlagQuery) != 0;
 }
 
 } // namespace Velmar::Private

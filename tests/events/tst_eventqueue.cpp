@@ -13,6 +13,7 @@
 #include <Velmar/CarbonEventHandlers.h>
 #include <Velmar/CarbonEvents.h>
 #include <Velmar/Events.h>
+#include <Velmar/FeatureFlags.h>
 #include <Velmar/HostCore.h>
 #include <Velmar/MacErrors.h>
 
@@ -276,6 +277,18 @@ private Q_SLOTS:
             QCOMPARE(item->attributes, 0u);
             QCOMPARE(item->modifiers & ~UInt32(alphaLock), 0u);
         }
+    }
+
+    // Without a window layer overriding it, the feature flag decides where updates go.
+    void legacyProcessingFollowsTheFeatureFlag()
+    {
+        const UInt32 saved = SupportLegacyMacEventProcessing(kFeatureFlagQuery);
+        SupportLegacyMacEventProcessing(0);
+        PostEvent(updateEvt, 1);
+        SupportLegacyMacEventProcessing(1);
+        PostEvent(updateEvt, 2);
+        SupportLegacyMacEventProcessing(saved);
+        QCOMPARE(queueSnapshot(), QStringList{"wind/1 msg=1"});
     }
 
     void fillNullEvent()
