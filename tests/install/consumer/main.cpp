@@ -1,15 +1,30 @@
-// A host that knows only the installed headers and the exported symbols.
+// A host that knows only the installed headers and the exported symbols: the README's
+// example, checked by reading a pixel back.
 #include <Velmar/Velmar.h>
 
 #include <cstdio>
 
-int main()
+using namespace Velmar;
+
+int main(int argc, char** argv)
 {
-    Rect r{10, 20, 30, 40};
-    Velmar::RGBColor c(0x00FF8001u);
-    Velmar::Str255 s;
-    Velmar::NumToString(-42, s);
-    const bool ok = r.bottom == 30 && c.red == 65535 && s[0] == 3 && s[1] == '-';
+    AQtApplication app(argc, argv, false);
+
+    GWorldPtr world = nullptr;
+    Rect bounds{0, 0, 100, 200};
+    NewGWorld(&world, 32, &bounds, nullptr, nullptr, 0);
+    SetGWorld(world, nullptr);
+    PenSize(3, 3);
+    FrameRect(&bounds);
+
+    RGBColor corner, inside;
+    GetCPixel(0, 0, &corner);
+    GetCPixel(50, 50, &inside);
+    Str255 text;
+    NumToString(-42, text);
+    DisposeGWorld(world);
+
+    const bool ok = corner.red == 0 && inside.red == 0xFFFF && text[0] == 3 && text[1] == '-';
     std::printf("consumer %s\n", ok ? "ok" : "wrong");
     return ok ? 0 : 1;
 }
