@@ -26,7 +26,7 @@ bool recordPenPoint(QtGrafPort* port, int h, int v)
         return false;
     VELMAR_ASSERT(port->polySave, "a polygon or region is being defined without its polygon");
     PolyPtr* polySave = port->polySave;
-    VELMAR_ASSERT(polySave != NULL && polySave->qPoly, "the open polygon has no points");
+    VELMAR_ASSERT(polySave != NULL, "a polygon or region is being defined without its polygon");
     if (port->definingRgn)
         VELMAR_ASSERT(port->rgnSave != NULL, "a region is being defined without its region");
     if (polySave && polySave->qPoly)
