@@ -84,6 +84,11 @@ namespace Velmar::Private {
 // one axis; steps repeat |d| times. Shrinking stops early once nothing is left.
 QRegion insetRegion(const QRegion& region, int dh, int dv)
 {
+    if (region.rectCount() == 1) {
+        // A rectangle loses or gains a pixel on each side per step: the same result at once.
+        const QRect b = region.boundingRect().adjusted(dh, dv, -dh, -dv);
+        return b.isEmpty() ? QRegion() : QRegion(b);
+    }
     QRegion r = region;
     const auto steps = [&r](int d, int mx, int my) {
         for (int i = std::abs(d); i > 0 && !r.isEmpty(); --i) {
