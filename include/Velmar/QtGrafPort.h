@@ -175,14 +175,21 @@ public:
             markWindowDirty(localRect);
     }
 
+    // Bumped by every setter above and by BeginPaint/EndPaint, and by RGBBackColor and the
+    // pen mode: the resolved brushes below are reused while it is unchanged. Code that
+    // changes the painter's pen or brush directly and leaves it changed must call inkChanged().
+    UInt32 inkSerial = 0;
+    void inkChanged() { ++inkSerial; }
+
     // Last resolved fill and background brushes, so that repeated drawing with the same
     // pattern and colours builds nothing. A cache, not state.
     struct BrushCache {
+        UInt32 serial = 0;
+        bool valid = false;
         QBrush source;
         QRgb ink = 0;
         QRgb paper = 0;
         bool transparentPaper = false;
-        bool valid = false;
         QBrush result;
     };
     BrushCache fillCache;

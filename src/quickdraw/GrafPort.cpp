@@ -1,5 +1,6 @@
 // The port object: creation, destruction, the lazily started painter, bounds and origin.
 #include <Velmar/Diagnostics.h>
+#include <Velmar/QDShapes.h>
 #include <Velmar/QtGrafPort.h>
 
 #include "quickdraw/GrafPortPrivate.h"
@@ -121,6 +122,10 @@ QtGrafPort::~QtGrafPort()
     }
     magic = kDeadMagic;
     unregisterPort(this);
+    // A region being recorded owns its scratch polygon; an open polygon belongs to its caller.
+    if (definingRgn && polySave)
+        KillPoly(polySave);
+    polySave = nullptr;
     delete rgnSave;
     rgnSave = nullptr;
     delete painter;
@@ -172,6 +177,7 @@ void QtGrafPort::BeginPaint()
         return;
     painterState.applyTo(*painter);
     m_painterActive = true;
+    ++inkSerial;
 
     auto& active = activePorts();
     active.push_back(this);
@@ -183,6 +189,7 @@ void QtGrafPort::BeginPaint()
 void QtGrafPort::EndPaint()
 {
     if (m_painterActive) {
+        ++inkSerial;
         painterState.saveFrom(*painter);
         painter->end();
         m_painterActive = false;
@@ -197,6 +204,7 @@ void QtGrafPort::EndPaint()
 
 void QtGrafPort::setPen(const QPen& pen)
 {
+    ++inkSerial;
     if (m_painterActive)
         painter->setPen(pen);
     else
@@ -205,6 +213,7 @@ void QtGrafPort::setPen(const QPen& pen)
 
 void QtGrafPort::setForeColor(const QColor& color)
 {
+    ++inkSerial;
     if (m_painterActive) {
         if (painter->pen().color() == color)
             return;
@@ -218,6 +227,7 @@ void QtGrafPort::setForeColor(const QColor& color)
 
 void QtGrafPort::setBrush(const QBrush& brush)
 {
+    ++inkSerial;
     if (m_painterActive)
         painter->setBrush(brush);
     else
@@ -226,6 +236,7 @@ void QtGrafPort::setBrush(const QBrush& brush)
 
 void QtGrafPort::setBackground(const QBrush& brush)
 {
+    ++inkSerial;
     if (m_painterActive)
         painter->setBackground(brush);
     else
@@ -234,6 +245,7 @@ void QtGrafPort::setBackground(const QBrush& brush)
 
 void QtGrafPort::setCompositionMode(QPainter::CompositionMode mode)
 {
+    ++inkSerial;
     if (m_painterActive)
         painter->setCompositionMode(mode);
     else

@@ -76,8 +76,10 @@ void RGBBackColor(const RGBColor* color)
         warnNoPort("warning: RGBBackColor: Can't get current port!");
         return;
     }
-    if (color)
+    if (color) {
         port->backColor = static_cast<QColor>(*color);
+        port->inkChanged();
+    }
 }
 
 void RGBForeColor(const RGBColor* color)

@@ -151,12 +151,13 @@ QBrush recolourBrush(const QBrush& brush, const QColor& ink, const QColor& paper
 
 namespace {
 
-const QBrush& resolveCached(QtGrafPort::BrushCache& cache, const QBrush& source,
+const QBrush& resolveCached(QtGrafPort::BrushCache& cache, UInt32 serial, const QBrush& source,
                             const QColor& ink, const QColor& paper, bool transparentPaper,
                             Qt::GlobalColor solidKey, const QColor& solidColor)
 {
     const QRgb inkKey = ink.rgba();
     const QRgb paperKey = paper.rgba();
+    cache.serial = serial;
     if (cache.valid && cache.ink == inkKey && cache.paper == paperKey
         && cache.transparentPaper == transparentPaper && cache.source == source)
         return cache.result;
@@ -174,17 +175,17 @@ const QBrush& resolveCached(QtGrafPort::BrushCache& cache, const QBrush& source,
 
 } // namespace
 
-const QBrush& resolvedFillBrush(QtGrafPort* port)
+const QBrush& resolveFillBrush(QtGrafPort* port)
 {
     const QColor ink = port->foreColor();
-    return resolveCached(port->fillCache, port->currentBrush(), ink, port->backColor,
-                         port->penMode == patOr, Qt::black, ink);
+    return resolveCached(port->fillCache, port->inkSerial, port->currentBrush(), ink,
+                         port->backColor, port->penMode == patOr, Qt::black, ink);
 }
 
-const QBrush& resolvedBackgroundBrush(QtGrafPort* port)
+const QBrush& resolveBackgroundBrush(QtGrafPort* port)
 {
-    return resolveCached(port->backCache, port->currentBackground(), port->foreColor(),
-                         port->backColor, false, Qt::white, port->backColor);
+    return resolveCached(port->backCache, port->inkSerial, port->currentBackground(),
+                         port->foreColor(), port->backColor, false, Qt::white, port->backColor);
 }
 
 QBrush resolvedPatternBrush(QtGrafPort* port, const QBrush& pattern)

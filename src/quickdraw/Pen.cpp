@@ -22,6 +22,7 @@ QtGrafPort* portOrWarn(const char* warning)
 void applyPenMode(QtGrafPort* port, SInt16 mode)
 {
     port->penMode = mode;
+    port->inkChanged();
     port->setCompositionMode(compositionModeForPenMode(mode));
 }
 

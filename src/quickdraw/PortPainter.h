@@ -32,9 +32,23 @@ inline bool isRecording(const QtGrafPort* port)
 // The brush Paint and Fill operations use: the pen pattern in the foreground colour, on the
 // back colour (or transparent paper under patOr). The reference stays valid until the next
 // call for the same port.
-const QBrush& resolvedFillBrush(QtGrafPort* port);
+const QBrush& resolveFillBrush(QtGrafPort* port);
+inline const QBrush& resolvedFillBrush(QtGrafPort* port)
+{
+    const QtGrafPort::BrushCache& cache = port->fillCache;
+    if (cache.valid && cache.serial == port->inkSerial)
+        return cache.result;
+    return resolveFillBrush(port);
+}
 // The brush Erase operations and ScrollRect use: the background pattern in the back colour.
-const QBrush& resolvedBackgroundBrush(QtGrafPort* port);
+const QBrush& resolveBackgroundBrush(QtGrafPort* port);
+inline const QBrush& resolvedBackgroundBrush(QtGrafPort* port)
+{
+    const QtGrafPort::BrushCache& cache = port->backCache;
+    if (cache.valid && cache.serial == port->inkSerial)
+        return cache.result;
+    return resolveBackgroundBrush(port);
+}
 // A given pattern resolved like the fill brush (FillRect and friends).
 QBrush resolvedPatternBrush(QtGrafPort* port, const QBrush& pattern);
 

@@ -280,6 +280,32 @@ private Q_SLOTS:
         DisposeGWorld(world);
     }
 
+    void directPainterChangesNeedInkChanged()
+    {
+        GrafPtr world = newInkedWorld(4);
+        paint(world, QRect(0, 0, 1, 1));
+        QCOMPARE(world->image()->pixel(0, 0), kInk);
+        // Pen colour changed behind the port's back, then announced.
+        QPen green = world->painter->pen();
+        green.setColor(QColor(kUnderneath));
+        world->painter->setPen(green);
+        world->inkChanged();
+        paint(world, QRect(1, 0, 1, 1));
+        QCOMPARE(world->image()->pixel(1, 0), kUnderneath);
+        // Ending and restarting the painter keeps the resolved colours right.
+        world->EndPaint();
+        paint(world, QRect(2, 0, 1, 1));
+        QCOMPARE(world->image()->pixel(2, 0), kUnderneath);
+        const RGBColor back(65535, 65535, 0);
+        RGBBackColor(&back);
+        {
+            MakeQPainter p("test");
+            p->fillRect(QRect(3, 0, 1, 1), Private::resolvedBackgroundBrush(world));
+        }
+        QCOMPARE(world->image()->pixel(3, 0), qRgb(255, 255, 0));
+        DisposeGWorld(world);
+    }
+
     void recolourRules()
     {
         const QColor ink(Qt::red);
