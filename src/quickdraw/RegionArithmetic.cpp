@@ -8,6 +8,7 @@
 #include <QRegion>
 #include <QTransform>
 
+#include <algorithm>
 #include <cstdlib>
 
 namespace Velmar {
@@ -80,8 +81,11 @@ void MapRgn(RgnHandle rgn, const Rect* src, const Rect* dst)
 
 namespace Velmar::Private {
 
-// One step shrinks (intersection) or grows (union) the region by a pixel on both sides of
-// one axis; steps repeat |d| times. Shrinking stops early once nothing is left.
+// Insetting by d is, per axis, the erosion (d > 0) or dilation (d < 0) of the region by the
+// segment [-|d|, |d|]: the same as |d| one-pixel steps, each intersecting (or uniting) the
+// region with itself moved a pixel either way. Steps combine: after reaching radius c, one
+// step that moves by s <= 2c + 1 reaches radius c + s, so the work grows with log |d| and
+// absurd values stay cheap. Shrinking stops early once nothing is left.
 QRegion insetRegion(const QRegion& region, int dh, int dv)
 {
     if (region.rectCount() == 1) {
@@ -90,14 +94,18 @@ QRegion insetRegion(const QRegion& region, int dh, int dv)
         return b.isEmpty() ? QRegion() : QRegion(b);
     }
     QRegion r = region;
-    const auto steps = [&r](int d, int mx, int my) {
-        for (int i = std::abs(d); i > 0 && !r.isEmpty(); --i) {
-            const QRegion a = r.translated(-mx, -my), b = r.translated(mx, my);
+    const auto axis = [&r](int d, int mx, int my) {
+        const int n = std::abs(d);
+        for (int c = 0; c < n && !r.isEmpty();) {
+            const int step = std::min(2 * c + 1, n - c);
+            const QRegion a = r.translated(-mx * step, -my * step);
+            const QRegion b = r.translated(mx * step, my * step);
             r = d > 0 ? r.intersected(a).intersected(b) : r.united(a).united(b);
+            c += step;
         }
     };
-    steps(dh, 1, 0);
-    steps(dv, 0, 1);
+    axis(dh, 1, 0);
+    axis(dv, 0, 1);
     return r;
 }
 

@@ -218,9 +218,9 @@ private Q_SLOTS:
     // the single-rectangle one.
     void insetRgnOfSeparatePieces()
     {
-        for (int d = -3; d <= 4; ++d) {
+        for (int d = -12; d <= 6; ++d) {
             Rgn both = rectRgn(0, 0, 10, 12);
-            Rgn far = rectRgn(40, 40, 60, 48);
+            Rgn far = rectRgn(80, 80, 100, 98);
             UnionRgn(both.get(), far.get(), both.get());
             Rgn a = rectRgn(0, 0, 10, 12);
             InsetRgn(a.get(), short(d), short(d));
@@ -228,6 +228,50 @@ private Q_SLOTS:
             InsetRgn(both.get(), short(d), short(d));
             UnionRgn(a.get(), far.get(), a.get());
             QVERIFY2(EqualRgn(both.get(), a.get()), QByteArray::number(d));
+        }
+    }
+
+    // Against the one-pixel-at-a-time definition, on random regions.
+    void insetRgnMatchesStepByStepDefinition()
+    {
+        const auto reference = [](QRegion r, int dh, int dv) {
+            for (int i = 0; i < std::abs(dh); ++i) {
+                const QRegion a = r.translated(-1, 0), b = r.translated(1, 0);
+                r = dh > 0 ? (r & a & b) : (r | a | b);
+            }
+            for (int i = 0; i < std::abs(dv); ++i) {
+                const QRegion a = r.translated(0, -1), b = r.translated(0, 1);
+                r = dv > 0 ? (r & a & b) : (r | a | b);
+            }
+            return r;
+        };
+        QRandomGenerator gen(99);
+        for (int round = 0; round < 40; ++round) {
+            Rgn r = randomRgn(gen);
+            const int dh = gen.bounded(-9, 10), dv = gen.bounded(-9, 10);
+            const QRegion expected = reference(*r, dh, dv);
+            InsetRgn(r.get(), short(dh), short(dv));
+            QVERIFY2(*r == expected, QByteArray::number(dh) + "," + QByteArray::number(dv));
+        }
+    }
+
+    // Growing an L shape by d is growing each of its arms by d; shrinking it back by d
+    // restores it (its corners are convex or the inner corner of two rectangles).
+    void insetRgnGrowsLShapeArmByArm()
+    {
+        for (int d : {1, 2, 3, 5, 8, 13, 100, 3000}) {
+            Rgn l = rectRgn(0, 0, 30, 8);
+            Rgn leg = rectRgn(0, 0, 8, 30);
+            UnionRgn(l.get(), leg.get(), l.get());
+            InsetRgn(l.get(), short(-d), short(-d));
+            const QRegion expected = QRegion(-d, -d, 30 + 2 * d, 8 + 2 * d)
+                                         .united(QRegion(-d, -d, 8 + 2 * d, 30 + 2 * d));
+            QVERIFY2(*l == expected, QByteArray::number(d));
+            InsetRgn(l.get(), short(d), short(d));
+            Rgn original = rectRgn(0, 0, 30, 8);
+            Rgn arm = rectRgn(0, 0, 8, 30);
+            UnionRgn(original.get(), arm.get(), original.get());
+            QVERIFY2(EqualRgn(l.get(), original.get()), QByteArray::number(d));
         }
     }
 
