@@ -68,6 +68,7 @@ private Q_SLOTS:
     void keys_data();
     void keys();
     void capsLockToggles();
+    void keypadFollowsNumLock();
     void leftButton();
 
 private:
@@ -86,7 +87,7 @@ void X11InputTest::initTestCase()
 void X11InputTest::cleanup()
 {
     // Never leave a key or button held on the display, whatever failed.
-    for (unsigned long keysym : {0x61ul, 0x35ul, 0xffe1ul, 0xffe4ul, 0xffbful, 0xff52ul})
+    for (unsigned long keysym : {0x61ul, 0x35ul, 0xffe1ul, 0xffe4ul, 0xffbful, 0xff52ul, 0xff95ul})
         m_xtest.key(keysym, false);
     m_xtest.button(1, false);
 }
@@ -137,6 +138,36 @@ void X11InputTest::capsLockToggles()
     m_xtest.key(0xffe5, true);
     m_xtest.key(0xffe5, false);
     QCOMPARE(Platform::isCapsLockToggled(), before);
+}
+
+// The keypad's 7 is Home with Num Lock off and VK_NUMPAD7 with it on, as on Windows.
+void X11InputTest::keypadFollowsNumLock()
+{
+    auto toggleNumLock = [this] {
+        m_xtest.key(0xff7f, true);
+        m_xtest.key(0xff7f, false);
+    };
+    Velmar::UInt8 state[256];
+    Platform::getKeyboardState(state);
+    const bool numLockWasOn = state[VK::NumLock] & 0x01;
+    if (numLockWasOn)
+        toggleNumLock();
+
+    m_xtest.key(0xff95, true); // the key of KP_Home / KP_7
+    QVERIFY(Platform::isAsyncKeyDown(VK::Home));
+    QVERIFY(!Platform::isAsyncKeyDown(VK::Numpad0 + 7));
+    m_xtest.key(0xff95, false);
+
+    toggleNumLock();
+    Platform::getKeyboardState(state);
+    QCOMPARE(int(state[VK::NumLock] & 0x01), 1);
+    m_xtest.key(0xff95, true);
+    QVERIFY(Platform::isAsyncKeyDown(VK::Numpad0 + 7));
+    QVERIFY(!Platform::isAsyncKeyDown(VK::Home));
+    m_xtest.key(0xff95, false);
+
+    if (!numLockWasOn)
+        toggleNumLock();
 }
 
 void X11InputTest::leftButton()
