@@ -32,7 +32,11 @@ void FrameOval(const Rect* r)
         return;
     }
     const QRect q = toQRect(r);
-    if (recordFrameShape(port, QRegion(q, QRegion::Ellipse)) || q.isEmpty())
+    if (port->definingRgn) {
+        recordFrameShape(port, QRegion(q, QRegion::Ellipse));
+        return;
+    }
+    if (q.isEmpty())
         return;
     strokeShape("FrameOval", q, [&q](QPainter* p) { p->drawEllipse(q); });
 }

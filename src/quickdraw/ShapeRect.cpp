@@ -35,8 +35,11 @@ void FrameRect(const Rect* r)
         return;
     }
     const QRect q = toQRect(r);
-    if (recordFrameShape(port, QRegion(q)))
+    // The region is built only while recording, so that drawing a frame allocates nothing.
+    if (port->definingRgn) {
+        recordFrameShape(port, QRegion(q));
         return;
+    }
     MakeQPainter painter(port, "FrameRect");
     if (!painter || q.isEmpty())
         return;
