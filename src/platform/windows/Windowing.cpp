@@ -51,8 +51,12 @@ void placeNativeWindowBehind(QWidget* window, QWidget* behind)
 
 QImage createWindowImage(int width, int height)
 {
-    if (width <= 0 || height <= 0)
+    // Toolbox coordinates are 16-bit: nothing larger can be a window's content.
+    if (width <= 0 || height <= 0 || width > 32767 || height > 32767) {
+        if (width > 0 && height > 0)
+            qWarning("createWindowImage: refused size %d x %d", width, height);
         return QImage();
+    }
 
     BITMAPINFO info = {};
     info.bmiHeader.biSize = sizeof(BITMAPINFOHEADER);
