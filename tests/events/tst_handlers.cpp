@@ -114,16 +114,6 @@ private Q_SLOTS:
         m_listener.reset();
     }
 
-    void targets()
-    {
-        QCOMPARE(GetApplicationEventTarget().targetType, UInt32(1));
-        QCOMPARE(GetEventDispatcherTarget().targetType, UInt32(2));
-        const EventTargetRef w = GetWindowEventTarget(kWindowA);
-        QCOMPARE(w.targetType, UInt32(3));
-        QCOMPARE(w.window, kWindowA);
-        QVERIFY(GetApplicationEventTarget().window == nullptr);
-    }
-
     // Installation order of handlers named by target (A application, D dispatcher, WA/WB
     // windows); each answers with its result. The event belongs to window A.
     void chainOrder_data()
