@@ -1,5 +1,6 @@
 #include "quickdraw/ShapePainting.h"
 
+#include <Velmar/Diagnostics.h>
 #include <Velmar/QuickDraw.h>
 
 #include "quickdraw/PortPainter.h"
@@ -9,8 +10,8 @@
 
 namespace Velmar::Private {
 
-bool verbInk(QtGrafPort* port, SInt16 verb, const PatPtr* pattern, QBrush* brush,
-             QPainter::CompositionMode* mode)
+bool verbInk(const char* caller, QtGrafPort* port, SInt16 verb, const PatPtr* pattern,
+             QBrush* brush, QPainter::CompositionMode* mode)
 {
     *mode = port->currentCompositionMode();
     switch (verb) {
@@ -23,7 +24,7 @@ bool verbInk(QtGrafPort* port, SInt16 verb, const PatPtr* pattern, QBrush* brush
         return true;
     case kQDGrafVerbFill:
         if (!pattern || !pattern->brush()) {
-            shapeWarning("warning: Fill: null pattern");
+            VelmarLog(kLogQuickDraw, "warning: %s: null pattern", caller);
             return false;
         }
         *brush = resolvedPatternBrush(port, *pattern->brush());
@@ -50,7 +51,7 @@ void fillShapeRect(const char* caller, SInt16 verb, const QRect& rect, const Pat
         return;
     QBrush brush;
     QPainter::CompositionMode mode;
-    if (!verbInk(painter.port(), verb, pattern, &brush, &mode))
+    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
         return;
     const QPainter::CompositionMode own = painter->compositionMode();
     if (mode != own)
@@ -69,7 +70,7 @@ void fillShapeRegion(const char* caller, SInt16 verb, const QRegion& region,
         return;
     QBrush brush;
     QPainter::CompositionMode mode;
-    if (!verbInk(painter.port(), verb, pattern, &brush, &mode))
+    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
         return;
     const QPainter::CompositionMode own = painter->compositionMode();
     if (mode != own)

@@ -45,8 +45,9 @@ private:
 // What a paint, erase, fill or invert verb fills with: the brush and the composition mode.
 // Paint and fill draw in the pen mode; erase always copies; invert flips the destination.
 // False (nothing to draw) for an unknown verb or a fill with a null pattern.
-bool verbInk(QtGrafPort* port, SInt16 verb, const PatPtr* pattern, QBrush* brush,
-             QPainter::CompositionMode* mode);
+// `caller` names the call in the log line about a null pattern.
+bool verbInk(const char* caller, QtGrafPort* port, SInt16 verb, const PatPtr* pattern,
+             QBrush* brush, QPainter::CompositionMode* mode);
 
 // The current pen's width in whole pixels (a cosmetic zero-width pen counts as 1), or 0 when
 // the pen draws nothing.
@@ -81,7 +82,7 @@ void fillShape(const char* caller, SInt16 verb, const QRect& dirty, const PatPtr
         return;
     QBrush brush;
     QPainter::CompositionMode mode;
-    if (!verbInk(painter.port(), verb, pattern, &brush, &mode))
+    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
         return;
     PainterTools tools(painter, QPen(Qt::NoPen), brush, mode);
     draw(static_cast<QPainter*>(painter));

@@ -154,6 +154,10 @@ private Q_SLOTS:
     void nullAndEmptyRectsDrawNothing()
     {
         World world;
+        VelmarTest::LogCapture log;
+        const Rect box = R(0, 0, 10, 10);
+        FillRect(&box, PatPtr(static_cast<const Pattern*>(nullptr)));
+        QVERIFY(log.contains("warning: FillRect: null pattern"));
         FrameRect(nullptr);
         PaintRect(nullptr);
         EraseRect(nullptr);
