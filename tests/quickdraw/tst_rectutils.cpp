@@ -182,37 +182,12 @@ private Q_SLOTS:
         QCOMPARE(PtInRect(P(15, 15), nullptr), 0);
     }
 
-    void equalRect()
-    {
-        const Rect a = R(1, 2, 3, 4), b = R(1, 2, 3, 4), c = R(1, 2, 3, 5);
-        QCOMPARE(EqualRect(&a, &b), 1);
-        QCOMPARE(EqualRect(&a, &c), 0);
-        QCOMPARE(EqualRect(nullptr, nullptr), 1);
-        QCOMPARE(EqualRect(&a, nullptr), 0);
-        QCOMPARE(EqualRect(nullptr, &a), 0);
-    }
-
     void pt2Rect()
     {
         Rect r{};
         Pt2Rect(P(30, 5), P(10, 25), &r);
         QVERIFY2(same(r, R(5, 10, 25, 30)), show(r));
         Pt2Rect(P(1, 1), P(2, 2), nullptr);
-    }
-
-    void points()
-    {
-        Point p{};
-        SetPt(&p, 3, 4);
-        QCOMPARE(p.h, 3);
-        QCOMPARE(p.v, 4);
-        SetPt(nullptr, 1, 1);
-        QCOMPARE(EqualPt(p, P(3, 4)), 1);
-        QCOMPARE(EqualPt(p, P(4, 3)), 0);
-        AddPt(P(1, 2), &p);
-        QVERIFY(EqualPt(p, P(4, 6)));
-        SubPt(P(4, 6), &p);
-        QVERIFY(EqualPt(p, P(0, 0)));
     }
 };
 

@@ -319,13 +319,6 @@ private Q_SLOTS:
         QCOMPARE(PtInRgn(P(19, 19), r.get()), 1);
         QCOMPARE(PtInRgn(P(20, 19), r.get()), 0);
     }
-
-    void emptyRegionBounds()
-    {
-        Rgn r = make();
-        const Rect b = bounds(r.get());
-        QVERIFY(b.top == 0 && b.left == 0 && b.bottom == 0 && b.right == 0);
-    }
 };
 
 VELMAR_TEST_MAIN(TestRegionAlgebra)
