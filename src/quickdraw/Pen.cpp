@@ -57,7 +57,7 @@ void PenSize(SInt16 width, SInt16 height)
         return;
     }
     // Only the width: a pen hidden by a zero size stays hidden.
-    if (current.width() == width && current.widthF() == width)
+    if (current.widthF() == width)
         return;
     QPen pen = current;
     pen.setWidth(width);
