@@ -6,6 +6,7 @@
 
 #include "events/EventQueue.h"
 #include "foundation/ApplicationPrivate.h"
+#include "platform/Platform.h"
 
 #include <QKeyEvent>
 #include <QThread>
@@ -89,6 +90,10 @@ bool AQtApplication::notify(QObject* receiver, QEvent* e)
 bool AQtApplication::filterAndDeliver(QObject* receiver, QEvent* e)
 {
     const bool inOwnThread = thread() == QThread::currentThread();
+    // Where the window system cannot be asked for key and button state, the platform
+    // layer answers from the input Qt delivers; every event passes here first.
+    if (inOwnThread)
+        Private::Platform::trackInputEvent(e);
     switch (e->type()) {
     case QEvent::Timer:
         if (inOwnThread && carbonEventsBlocked()) {
