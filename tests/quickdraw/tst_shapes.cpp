@@ -9,6 +9,8 @@
 #include "quickdraw/ArcAngles.h"
 #include "quickdraw/GrafPortPrivate.h"
 
+#include <QPolygon>
+
 using namespace Velmar;
 using namespace ShapeTest;
 
@@ -347,6 +349,10 @@ private Q_SLOTS:
             QRect mustCover;
         };
         const Rect r = R(10, 20, 30, 60);
+        QRegion region(30, 40, 20, 10);
+        RgnHandle rgn = &region;
+        QPolygon points({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
+        PolyPtr poly{&points};
         const QList<Case> cases = {
             {"FrameRect", [&] { FrameRect(&r); }, QRect(20, 10, 40, 20)},
             {"PaintRect", [&] { PaintRect(&r); }, QRect(20, 10, 40, 20)},
@@ -356,6 +362,13 @@ private Q_SLOTS:
             {"FrameArc", [&] { FrameArc(&r, 0, 90); }, QRect(20, 10, 40, 20)},
             {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, QRect(20, 10, 40, 20)},
             {"LineTo", [&] { MoveTo(5, 70); LineTo(50, 60); }, QRect(5, 60, 46, 11)},
+            {"EraseRect", [&] { EraseRect(&r); }, QRect(20, 10, 40, 20)},
+            {"FillRect", [&] { FillRect(&r, GetQDGlobalsGray(nullptr)); }, QRect(20, 10, 40, 20)},
+            {"PaintRgn", [&] { PaintRgn(rgn); }, QRect(30, 40, 20, 10)},
+            {"FrameRgn", [&] { FrameRgn(rgn); }, QRect(30, 40, 20, 10)},
+            {"InvertRgn", [&] { InvertRgn(rgn); }, QRect(30, 40, 20, 10)},
+            {"FramePoly", [&] { FramePoly(&poly); }, QRect(10, 10, 31, 21)},
+            {"PaintPoly", [&] { PaintPoly(&poly); }, QRect(10, 10, 31, 21)},
         };
         for (const Case& c : cases) {
             DirtyLog::rects().clear();
@@ -364,6 +377,8 @@ private Q_SLOTS:
             for (const QRect& d : DirtyLog::rects())
                 dirty |= d;
             QVERIFY2(dirty.contains(c.mustCover), c.name);
+            // Precise: not the whole port, which is what a call that named nothing reports.
+            QVERIFY2(dirty.width() < 90 && dirty.height() < 90, c.name);
         }
         SetPort(previous);
         delete port;
