@@ -52,16 +52,12 @@ VELMAR_EXPORT void ClipRect(const Rect* r);
 // The desktop: the available geometry of every screen. The region belongs to the library.
 VELMAR_EXPORT RgnHandle GetGrayRgn();
 
-// Dragging a grey outline of a region with the mouse (implemented with the windows, which
-// it needs). Returns the vertical offset in the high 16 bits and the horizontal offset in
-// the low 16 bits; 0x80008000 when the drag ended outside the slop rectangle.
+// Axis constraints for dragging a region's outline.
 enum : SInt16 {
     noConstraint = 0,
     hAxisOnly = 1,
     vAxisOnly = 2,
 };
-VELMAR_EXPORT SInt32 DragGrayRgn(RgnHandle rgn, Point start, const Rect* limitRect,
-                                 const Rect* slopRect, short axis, void (*actionProc)());
 
 // Closes and discards a region still being defined on the current port when the scope ends,
 // so that an early return or an exception never leaves the port recording.
