@@ -220,6 +220,32 @@ private Q_SLOTS:
         QCOMPARE(seen, expected + QStringList{"vlmr/clos@w1 sync"});
     }
 
+    // A handler that disposes of the event's window: the event counts as consumed and the
+    // window's queued events are revoked.
+    void windowDisposedDuringSynchronousDispatch()
+    {
+        AssertRecorder asserts;
+        FakeWindows windows;
+        FakeWaiter fakeWaiter(true);
+        schedule("w1 keyb/1 N msg=1");
+        schedule("w2 keyb/1 N msg=2");
+        EventHandlerRef ref = nullptr;
+        InstallEventHandler(
+            GetEventDispatcherTarget(),
+            [](EventHandlerCallRef, EventRef event, void*) -> OSStatus {
+                log() << QStringLiteral("handler: ") + describe(event);
+                Private::FlushEventReferences(event->window);
+                log() << QStringLiteral("after disposal: ") + describe(event);
+                return eventNotHandledErr;
+            },
+            0, nullptr, nullptr, &ref);
+        schedule("w1 vlmr/1836021349 N msg=3"); // 'move'
+        RemoveEventHandler(ref);
+        QCOMPARE(log() + queueSnapshot(),
+                 (QStringList{"handler: vlmr/move@w1 msg=3", "clear pending w1", "after disposal: vlmr/move msg=3",
+                              "keyb/1@w2 msg=2"}));
+    }
+
     void windowsOnTheirWayOutAndLegacyUpdates()
     {
         AssertRecorder asserts;
