@@ -1,21 +1,14 @@
 // Offscreen worlds: creation rules, resizing, disposal, bounds and origin, bad input.
-#include <Velmar/Diagnostics.h>
-#include <Velmar/QtGrafPort.h>
-#include <Velmar/QuickDraw.h>
-
-#include "TestSupport.h"
-#include "foundation/Conversions.h"
-#include "quickdraw/GrafPortPrivate.h"
-#include "quickdraw/PortPainter.h"
-
-#include <QImage>
+#include "PortTestSupport.h"
 
 using namespace Velmar;
 using Velmar::Private::makeRect;
+using VelmarTest::World;
 
 namespace {
 
-QString rectText(const Rect& r)
+// "top,left,bottom,right"
+QString text(const Rect& r)
 {
     return QStringLiteral("%1,%2,%3,%4").arg(r.top).arg(r.left).arg(r.bottom).arg(r.right);
 }
@@ -24,7 +17,7 @@ QString boundsOf(GrafPtr port)
 {
     Rect r;
     GetPortBounds(port, &r);
-    return rectText(r);
+    return text(r);
 }
 
 } // namespace
@@ -39,31 +32,26 @@ private Q_SLOTS:
         SetPort(nullptr);
     }
 
-    void newGWorldBounds_data()
+    void newGWorld_data()
     {
         QTest::addColumn<int>("depth");
-        QTest::addColumn<int>("top");
-        QTest::addColumn<int>("left");
-        QTest::addColumn<int>("bottom");
-        QTest::addColumn<int>("right");
+        QTest::addColumn<QString>("ltrb"); // the Rect asked for: left, top, right, bottom
         QTest::addColumn<QString>("expected");
         QTest::addColumn<QSize>("imageSize");
-        QTest::newRow("zero size widened") << 32 << 10 << 10 << 10 << 10 << "10,10,11,11" << QSize(1, 1);
-        QTest::newRow("depth 0 moves to origin") << 0 << 10 << 20 << 30 << 60 << "0,0,20,40" << QSize(40, 20);
-        QTest::newRow("depth 32 keeps position") << 32 << 10 << 20 << 30 << 60 << "10,20,30,60" << QSize(40, 20);
-        QTest::newRow("negative size forced to one") << 32 << 10 << 10 << 5 << 5 << "10,10,11,11" << QSize(1, 1);
-        QTest::newRow("zero width only") << 32 << 0 << 0 << 10 << 0 << "0,0,10,1" << QSize(1, 10);
+        QTest::newRow("zero size widened") << 32 << "10,10,10,10" << "10,10,11,11" << QSize(1, 1);
+        QTest::newRow("depth 0 at origin") << 0 << "20,10,60,30" << "0,0,20,40" << QSize(40, 20);
+        QTest::newRow("depth 32 in place") << 32 << "20,10,60,30" << "10,20,30,60" << QSize(40, 20);
+        QTest::newRow("negative size to one") << 32 << "10,10,5,5" << "10,10,11,11" << QSize(1, 1);
+        QTest::newRow("zero width only") << 32 << "0,0,0,10" << "0,0,10,1" << QSize(1, 10);
     }
-    void newGWorldBounds()
+    void newGWorld()
     {
         QFETCH(int, depth);
-        QFETCH(int, top);
-        QFETCH(int, left);
-        QFETCH(int, bottom);
-        QFETCH(int, right);
+        QFETCH(QString, ltrb);
         QFETCH(QString, expected);
         QFETCH(QSize, imageSize);
-        const Rect r = makeRect(left, top, right, bottom);
+        const QStringList v = ltrb.split(QLatin1Char(','));
+        const Rect r = makeRect(v[0].toInt(), v[1].toInt(), v[2].toInt(), v[3].toInt());
         GrafPtr world = nullptr;
         QCOMPARE(NewGWorld(&world, SInt16(depth), &r, nullptr, nullptr, 0), SInt16(0));
         QVERIFY(IsValidPort(world));
@@ -72,43 +60,45 @@ private Q_SLOTS:
         QCOMPARE(world->image()->size(), imageSize);
         QCOMPARE(world->image()->format(), QImage::Format_ARGB32_Premultiplied);
         QCOMPARE(GetPortPixMap(world)->pixelDepth(), SInt16(depth ? depth : 6));
+        // A fresh world: cleared with the back colour, pen at the top-left, nothing clipped.
+        QCOMPARE(world->image()->pixel(imageSize.width() - 1, imageSize.height() - 1),
+                 qRgb(255, 255, 255));
+        QCOMPARE(world->opColor, QColor(Qt::black));
+        QCOMPARE(world->backColor, QColor(Qt::white));
+        QCOMPARE(world->penMode, SInt16(patCopy));
+        QCOMPARE(QPoint(world->penX, world->penY), world->bounds.topLeft());
+        QCOMPARE(world->visibleRegion, QRegion(world->bounds));
+        QCOMPARE(world->clipRegion, QRegion(QRect(-32767, -32767, 65534, 65534)));
+        QCOMPARE(world->clipInForce, UInt8(0));
         DisposeGWorld(world);
         QVERIFY(!IsValidPort(world));
     }
 
-    void freshWorldState()
+    void nullAndStaleArguments()
     {
-        const Rect r = makeRect(5, 7, 25, 17);
-        GrafPtr world = nullptr;
-        NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-        QCOMPARE(world->window, nullptr);
-        QCOMPARE(world->opColor, QColor(Qt::black));
-        QCOMPARE(world->backColor, QColor(Qt::white));
-        QCOMPARE(world->penMode, SInt16(patCopy));
-        QCOMPARE(world->penX, 5);
-        QCOMPARE(world->penY, 7);
-        QCOMPARE(world->magic, 0x51744750u);
-        QCOMPARE(world->clipRegion, QRegion(QRect(-32767, -32767, 65534, 65534)));
-        QCOMPARE(world->clipRegion.boundingRect().right(), 32766);
-        QCOMPARE(world->visibleRegion, QRegion(QRect(5, 7, 20, 10)));
-        QCOMPARE(world->appFontFlag, UInt8(1));
-        QCOMPARE(world->clipInForce, UInt8(0));
-        // Cleared with the back colour.
-        QCOMPARE(world->image()->pixel(0, 0), qRgb(255, 255, 255));
-        QCOMPARE(world->image()->pixel(19, 9), qRgb(255, 255, 255));
-        DisposeGWorld(world);
-    }
-
-    void nullBoundsAndNullOut()
-    {
+        VelmarTest::ScriptedAutomationListener answers;
+        DisposeGWorld(nullptr);
+        QCOMPARE(answers.questions().size(), 1);
+        QVERIFY(answers.questions().first().text.contains(
+            QStringLiteral("offscreenGWorld != NULL && offscreenGWorld->window == NULL")));
         GrafPtr world = nullptr;
         NewGWorld(&world, 0, nullptr, nullptr, nullptr, 0);
         QCOMPARE(boundsOf(world), QStringLiteral("0,0,1,1"));
         DisposeGWorld(world);
+        DisposeGWorld(world); // stale: refused, no double free
+        DisposePort(world);
+        DisposePort(nullptr);
+        QVERIFY(!GetPortPixMap(nullptr));
+        QVERIFY(!GetPortBitMapForCopyBits(nullptr).image());
+        QVERIFY(answers.questions().last().text.contains(QStringLiteral("port != NULL")));
         // No place to put the world: nothing leaks into the port list, nothing crashes.
         const auto before = Private::livePorts().size();
         QCOMPARE(NewGWorld(nullptr, 0, nullptr, nullptr, nullptr, 0), SInt16(0));
         QCOMPARE(Private::livePorts().size(), before);
+        Rect r = makeRect(1, 2, 3, 4);
+        QCOMPARE(GetPortBounds(nullptr, &r), &r);
+        QCOMPARE(text(r), QStringLiteral("0,0,0,0"));
+        QCOMPARE(GetPortBounds(nullptr, nullptr), nullptr);
     }
 
     void hugeWorldIsRefusedNotFatal()
@@ -123,10 +113,7 @@ private Q_SLOTS:
         QCOMPARE(world->image(), nullptr);
         // Drawing and reading pixels are harmless no-ops.
         SetPort(world);
-        {
-            MakeQPainter painter("PaintRect");
-            QVERIFY(!painter);
-        }
+        QVERIFY(!MakeQPainter("PaintRect"));
         RGBColor c(1, 2, 3);
         const RGBColor red(65535, 0, 0);
         SetCPixel(10, 10, &red);
@@ -147,10 +134,7 @@ private Q_SLOTS:
 
     void updateGWorldKeepsTopLeftPixels()
     {
-        const Rect r = makeRect(0, 0, 20, 20);
-        GrafPtr world = nullptr;
-        NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-        SetPort(world);
+        World world(20);
         const RGBColor red(65535, 0, 0);
         const RGBColor blue(0, 0, 65535);
         SetCPixel(0, 0, &red);
@@ -158,7 +142,8 @@ private Q_SLOTS:
         SetCPixel(15, 15, &blue); // cut off by the shrink
 
         GrafPtr handle = world;
-        QCOMPARE(UpdateGWorld(&handle, 32, &r, nullptr, nullptr, 0), UInt32(0));
+        const Rect same = makeRect(0, 0, 20, 20);
+        QCOMPARE(UpdateGWorld(&handle, 32, &same, nullptr, nullptr, 0), UInt32(0));
         const Rect wider = makeRect(0, 0, 30, 10);
         QCOMPARE(UpdateGWorld(&handle, 32, &wider, nullptr, nullptr, 0), UInt32(reallocPix));
         QCOMPARE(boundsOf(world), QStringLiteral("0,0,10,30"));
@@ -171,13 +156,11 @@ private Q_SLOTS:
         // The new area is cleared with the back colour and is drawable (not clipped away).
         GetCPixel(25, 5, &c);
         QCOMPARE(quint32(c), 0xFFFFFFFFu);
-        SetCPixel(25, 5, &red);
-        QPainter* p = Private::portPainter(world, "test");
+        QPainter* p = world.painter();
         QVERIFY(p);
         p->fillRect(QRect(20, 0, 10, 10), Private::resolvedFillBrush(world));
         GetCPixel(29, 9, &c);
         QCOMPARE(quint32(c), 0xFF000000u);
-        DisposeGWorld(world);
     }
 
     void setPortBoundsBadSizes()
@@ -200,66 +183,30 @@ private Q_SLOTS:
         QVERIFY(!IsValidPort(port));
     }
 
-    void portBoundsNull()
-    {
-        Rect r = makeRect(1, 2, 3, 4);
-        QCOMPARE(GetPortBounds(nullptr, &r), &r);
-        QCOMPARE(rectText(r), QStringLiteral("0,0,0,0"));
-        QCOMPARE(GetPortBounds(nullptr, nullptr), nullptr);
-    }
-
     void portSizeAndOrigin()
     {
-        VelmarTest::LogCapture log;
-        PortSize(10, 10);
-        QVERIFY(log.contains(QStringLiteral("PortSize: current port is NULL")));
-        SetOrigin(1, 1);
-        QVERIFY(log.contains(QStringLiteral("SetOrigin: currentGrafPort = NULL")));
-
-        const Rect r = makeRect(0, 0, 40, 30);
-        GrafPtr world = nullptr;
-        NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-        SetPort(world);
+        World world(40, 30);
         SetOrigin(100, 200);
         QCOMPARE(boundsOf(world), QStringLiteral("200,100,230,140"));
         // Local (100, 200) is the image's top-left pixel.
         const RGBColor red(65535, 0, 0);
         SetCPixel(100, 200, &red);
-        QCOMPARE(world->image()->pixel(0, 0), qRgb(255, 0, 0));
+        QCOMPARE(world.pixel(0, 0), qRgb(255, 0, 0));
         SetCPixel(139, 229, &red);
-        QCOMPARE(world->image()->pixel(39, 29), qRgb(255, 0, 0));
+        QCOMPARE(world.pixel(39, 29), qRgb(255, 0, 0));
         // Drawing through the painter uses the same mapping, also once it is active.
-        QPainter* p = Private::portPainter(world, "test");
+        QPainter* p = world.painter();
         QVERIFY(p);
         p->fillRect(QRect(101, 200, 1, 1), QColor(0, 0, 255));
-        QCOMPARE(world->image()->pixel(1, 0), qRgb(0, 0, 255));
+        QCOMPARE(world.pixel(1, 0), qRgb(0, 0, 255));
         SetOrigin(0, 0);
         p->fillRect(QRect(2, 0, 1, 1), QColor(0, 255, 0));
-        QCOMPARE(world->image()->pixel(2, 0), qRgb(0, 255, 0));
+        QCOMPARE(world.pixel(2, 0), qRgb(0, 255, 0));
         // PortSize keeps the origin.
         SetOrigin(5, 6);
         PortSize(20, 10);
         QCOMPARE(boundsOf(world), QStringLiteral("6,5,16,25"));
-        QCOMPARE(world->image()->size(), QSize(20, 10));
-        DisposeGWorld(world);
-    }
-
-    void disposeBadWorlds()
-    {
-        VelmarTest::ScriptedAutomationListener answers;
-        DisposeGWorld(nullptr);
-        QCOMPARE(answers.questions().size(), 1);
-        QVERIFY(answers.questions().first().text.contains(
-            QStringLiteral("offscreenGWorld != NULL && offscreenGWorld->window == NULL")));
-        GrafPtr world = nullptr;
-        NewGWorld(&world, 0, nullptr, nullptr, nullptr, 0);
-        DisposeGWorld(world);
-        DisposeGWorld(world); // stale: refused, no double free
-        DisposePort(world);
-        DisposePort(nullptr);
-        QVERIFY(!GetPortPixMap(nullptr));
-        QVERIFY(!GetPortBitMapForCopyBits(nullptr).image());
-        QVERIFY(answers.questions().last().text.contains(QStringLiteral("port != NULL")));
+        QCOMPARE(world.image().size(), QSize(20, 10));
     }
 
     void paintDeviceWorld()

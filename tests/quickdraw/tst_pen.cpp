@@ -1,27 +1,8 @@
-// The pen: size, visibility, mode, style, pen state, and the no-port warnings.
-#include <Velmar/Diagnostics.h>
-#include <Velmar/QtGrafPort.h>
-#include <Velmar/QuickDraw.h>
-
-#include "TestSupport.h"
-#include "foundation/Conversions.h"
-#include "quickdraw/PortPainter.h"
+// The pen: size, visibility, mode and the pen state record.
+#include "PortTestSupport.h"
 
 using namespace Velmar;
-using Velmar::Private::makeRect;
-
-namespace {
-
-GrafPtr newCurrentWorld()
-{
-    const Rect r = makeRect(0, 0, 8, 8);
-    GrafPtr world = nullptr;
-    NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-    SetPort(world);
-    return world;
-}
-
-} // namespace
+using VelmarTest::World;
 
 class TestPen : public QObject {
     Q_OBJECT
@@ -33,19 +14,19 @@ private Q_SLOTS:
         SetPort(nullptr);
     }
 
-    // Each case runs with the painter inactive and active: the state must not depend on it.
-    void penSizeVisibility_data()
+    // The rules hold with the painter inactive and active: the state must not depend on it.
+    void penSizeAndVisibility_data()
     {
         QTest::addColumn<bool>("active");
         QTest::newRow("no painter") << false;
         QTest::newRow("painter") << true;
     }
-    void penSizeVisibility()
+    void penSizeAndVisibility()
     {
         QFETCH(bool, active);
-        GrafPtr world = newCurrentWorld();
+        World world(8);
         if (active)
-            QVERIFY(Private::portPainter(world, "test"));
+            QVERIFY(world.painter());
         const RGBColor blue(0, 0, 65535);
         RGBForeColor(&blue);
         PenSize(0, 5);
@@ -63,16 +44,8 @@ private Q_SLOTS:
         QCOMPARE(pen.joinStyle(), Qt::BevelJoin);
         QCOMPARE(pen.color(), QColor(0, 0, 255));
         QCOMPARE(world->isActive(), active);
-        DisposeGWorld(world);
-    }
 
-    void hideAndShowNest_data() { penSizeVisibility_data(); }
-    void hideAndShowNest()
-    {
-        QFETCH(bool, active);
-        GrafPtr world = newCurrentWorld();
-        if (active)
-            QVERIFY(Private::portPainter(world, "test"));
+        // HidePen and ShowPen nest; the pen comes back with the colour chosen while hidden.
         PenSize(2, 2);
         SetPenStyle(Qt::DashLine);
         HidePen();
@@ -81,7 +54,6 @@ private Q_SLOTS:
         QCOMPARE(world->currentPen().style(), Qt::NoPen);
         ShowPen();
         QCOMPARE(world->currentPen().style(), Qt::NoPen);
-        // A colour chosen while hidden is kept when the pen shows again.
         const RGBColor green(0, 65535, 0);
         RGBForeColor(&green);
         ShowPen();
@@ -90,53 +62,47 @@ private Q_SLOTS:
         QCOMPARE(world->currentPen().width(), 2);
         QCOMPARE(world->currentPen().color(), QColor(0, 255, 0));
         QCOMPARE(GetPenStyle(), int(Qt::DashLine));
-        DisposeGWorld(world);
     }
 
     void penModes_data()
     {
         QTest::addColumn<int>("mode");
         QTest::addColumn<int>("composition");
-        const struct {
-            int mode;
-            QPainter::CompositionMode composition;
-        } table[] = {
-            {srcCopy, QPainter::CompositionMode_SourceOver},
-            {srcOr, QPainter::CompositionMode_SourceOver},
-            {srcXor, QPainter::RasterOp_NotSourceXorDestination},
-            {3, QPainter::CompositionMode_SourceOver},
-            {patCopy, QPainter::CompositionMode_SourceOver},
-            {patOr, QPainter::CompositionMode_SourceOver},
-            {patXor, QPainter::RasterOp_NotSourceXorDestination},
-            {patBic, QPainter::CompositionMode_DestinationOver},
-            {notPatCopy, QPainter::CompositionMode_SourceOver},
-            {subPin, QPainter::CompositionMode_Exclusion},
-            {-1, QPainter::CompositionMode_SourceOver},
-            {1000, QPainter::CompositionMode_SourceOver},
-        };
-        for (const auto& row : table)
-            QTest::newRow(qPrintable(QString::number(row.mode))) << row.mode << int(row.composition);
+        const int over = QPainter::CompositionMode_SourceOver;
+        const int notXor = QPainter::RasterOp_NotSourceXorDestination;
+        QTest::newRow("srcCopy") << int(srcCopy) << over;
+        QTest::newRow("srcOr") << int(srcOr) << over;
+        QTest::newRow("srcXor") << int(srcXor) << notXor;
+        QTest::newRow("3") << 3 << over;
+        QTest::newRow("patCopy") << int(patCopy) << over;
+        QTest::newRow("patOr") << int(patOr) << over;
+        QTest::newRow("patXor") << int(patXor) << notXor;
+        QTest::newRow("patBic") << int(patBic) << int(QPainter::CompositionMode_DestinationOver);
+        QTest::newRow("notPatCopy") << int(notPatCopy) << over;
+        QTest::newRow("subPin") << int(subPin) << int(QPainter::CompositionMode_Exclusion);
+        QTest::newRow("-1") << -1 << over;
+        QTest::newRow("1000") << 1000 << over;
     }
     void penModes()
     {
         QFETCH(int, mode);
         QFETCH(int, composition);
-        GrafPtr world = newCurrentWorld();
+        World world(8);
         PenMode(SInt16(mode));
         QCOMPARE(GetPortPenMode(world), SInt16(mode));
         QCOMPARE(int(world->currentCompositionMode()), composition);
-        QVERIFY(Private::portPainter(world, "test"));
+        QVERIFY(world.painter());
         QCOMPARE(int(world->painter->compositionMode()), composition);
         PenNormal();
         QCOMPARE(GetPortPenMode(world), SInt16(patCopy));
         QCOMPARE(world->painter->compositionMode(), QPainter::CompositionMode_SourceOver);
-        DisposeGWorld(world);
     }
 
     void penStateRoundTrip()
     {
-        GrafPtr world = newCurrentWorld();
-        PenState state(QPoint(3, 4), 5, patXor, *GetQDGlobalsGray(nullptr).brush());
+        World world(8);
+        const QBrush gray = *GetQDGlobalsGray(nullptr).brush();
+        PenState state(QPoint(3, 4), 5, patXor, gray);
         SetPenState(&state);
         Point pen;
         GetPen(&pen);
@@ -153,7 +119,7 @@ private Q_SLOTS:
         QCOMPARE(saved.penLocation(), QPoint(3, 4));
         QCOMPARE(saved.penSize(), 5);
         QCOMPARE(saved.penMode(), SInt16(patXor));
-        QCOMPARE(saved.penPattern(), *GetQDGlobalsGray(nullptr).brush());
+        QCOMPARE(saved.penPattern(), gray);
         // Copies are independent.
         PenState copy(saved);
         copy.setPenLocation(QPoint(9, 9));
@@ -164,33 +130,6 @@ private Q_SLOTS:
         SetPenState(nullptr);
         GetPenState(nullptr);
         GetPen(nullptr);
-        DisposeGWorld(world);
-    }
-
-    void noPortWarnings()
-    {
-        VelmarTest::LogCapture log;
-        PenPat(GetQDGlobalsGray(nullptr));
-        BackPat(GetQDGlobalsGray(nullptr));
-        PenSize(1, 1);
-        PenMode(patCopy);
-        HidePen();
-        ShowPen();
-        SetPenStyle(1);
-        QCOMPARE(GetPenStyle(), int(Qt::SolidLine));
-        PenState state;
-        GetPenState(&state);
-        SetPenState(&state);
-        PenNormal();
-        Point p;
-        GetPen(&p);
-        for (const char* name : {"PenPat", "BackPat", "PenSize", "PenMode", "HidePen", "ShowPen",
-                                 "SetPenStyle", "GetPenStyle", "GetPenState", "SetPenState",
-                                 "PenNormal", "GetPen"}) {
-            const QString text = QStringLiteral("warning: %1: Can't get current port !")
-                                     .arg(QLatin1String(name));
-            QVERIFY2(log.contains(text), qPrintable(text));
-        }
     }
 };
 

@@ -1,52 +1,27 @@
-// The current port, the painter cap, dirty marking, port state, pixels and scrolling.
-#include <Velmar/Diagnostics.h>
-#include <Velmar/QtGrafPort.h>
-#include <Velmar/QuickDraw.h>
-
-#include "TestSupport.h"
-#include "foundation/Conversions.h"
-#include "quickdraw/GrafPortPrivate.h"
-#include "quickdraw/PortPainter.h"
-
-#include <QImage>
+// The current port, the painter cap, dirty marking, port state, the no-port warnings,
+// pixels and scrolling.
+#include "PortTestSupport.h"
 
 #include <memory>
 #include <vector>
 
 using namespace Velmar;
 using Velmar::Private::makeRect;
+using VelmarTest::World;
 
 namespace {
-
-GrafPtr newWorld(int width, int height)
-{
-    const Rect r = makeRect(0, 0, width, height);
-    GrafPtr world = nullptr;
-    NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-    return world;
-}
 
 // A window port without a real window: the hooks below stand in for the window layer.
 AQtWindow* const kFakeWindow = reinterpret_cast<AQtWindow*>(0x1000);
 QList<QRect> gDirty;
 QtGrafPort* gFrontPort = nullptr;
 
-void recordDirty(AQtWindow*, const QRect& r)
-{
-    gDirty.append(r);
-}
-
-QtGrafPort* frontPort(AQtWindow*)
-{
-    return gFrontPort;
-}
-
 struct HookScope {
     HookScope()
     {
         Private::PortWindowHooks hooks;
-        hooks.markDirty = &recordDirty;
-        hooks.frontVisiblePortExcept = &frontPort;
+        hooks.markDirty = [](AQtWindow*, const QRect& r) { gDirty.append(r); };
+        hooks.frontVisiblePortExcept = [](AQtWindow*) { return gFrontPort; };
         Private::setPortWindowHooks(hooks);
         gDirty.clear();
     }
@@ -59,10 +34,44 @@ QtGrafPort* newWindowPort(int width, int height)
     return new QtGrafPort(kFakeWindow, QRect(0, 0, width, height), image);
 }
 
-QRgb pixelAt(GrafPtr port, int x, int y)
-{
-    return port->image()->pixel(x, y);
-}
+// Every call that needs the current port, and the exact line it logs without one.
+struct NoPortCase {
+    const char* warning;
+    void (*call)();
+};
+const NoPortCase kNoPortCases[] = {
+    {"warning: FrameRect: Can't get current port!",
+     [] { QVERIFY(!Private::portPainter(nullptr, "FrameRect")); }},
+    {"warning: PaintOval: Can't get current port!", [] { QVERIFY(!MakeQPainter("PaintOval")); }},
+    {"warning: GetBackColor: Can't get current port !",
+     [] { RGBColor c(7, 7, 7); GetBackColor(&c); QCOMPARE(c.red, (unsigned short)7); }},
+    {"warning: GetForeColor: Can't get current port!",
+     [] { RGBColor c(7, 7, 7); GetForeColor(&c); QCOMPARE(c.red, (unsigned short)7); }},
+    {"warning: RGBBackColor: Can't get current port!", [] { RGBBackColor(nullptr); }},
+    {"warning: RGBForeColor: Can't get current port!", [] { RGBForeColor(nullptr); }},
+    {"OpColor: Can't get port", [] { OpColor(nullptr); }},
+    {"warning: HiliteColor: Can't get current port!", [] { HiliteColor(nullptr); }},
+    {"warning: SetCPixel: cannot get Qt port", [] { SetCPixel(0, 0, nullptr); }},
+    {"warning: GetPortPenLocation: cannot get Qt port",
+     [] { Point pt; QVERIFY(!GetPortPenLocation(nullptr, &pt)); }},
+    {"warning: GetPortPenMode: cannot get Qt port",
+     [] { QCOMPARE(GetPortPenMode(nullptr), SInt16(0)); }},
+    {"PortSize: current port is NULL", [] { PortSize(10, 10); }},
+    {"SetOrigin: currentGrafPort = NULL", [] { SetOrigin(1, 1); }},
+    {"warning: PenPat: Can't get current port !", [] { PenPat(GetQDGlobalsGray(nullptr)); }},
+    {"warning: BackPat: Can't get current port !", [] { BackPat(GetQDGlobalsGray(nullptr)); }},
+    {"warning: PenSize: Can't get current port !", [] { PenSize(1, 1); }},
+    {"warning: PenMode: Can't get current port !", [] { PenMode(patCopy); }},
+    {"warning: HidePen: Can't get current port !", [] { HidePen(); }},
+    {"warning: ShowPen: Can't get current port !", [] { ShowPen(); }},
+    {"warning: SetPenStyle: Can't get current port !", [] { SetPenStyle(1); }},
+    {"warning: GetPenStyle: Can't get current port !",
+     [] { QCOMPARE(GetPenStyle(), int(Qt::SolidLine)); }},
+    {"warning: GetPenState: Can't get current port !", [] { PenState s; GetPenState(&s); }},
+    {"warning: SetPenState: Can't get current port !", [] { PenState s; SetPenState(&s); }},
+    {"warning: PenNormal: Can't get current port !", [] { PenNormal(); }},
+    {"warning: GetPen: Can't get current port !", [] { Point pt; GetPen(&pt); }},
+};
 
 } // namespace
 
@@ -76,79 +85,69 @@ private Q_SLOTS:
         SetPort(nullptr);
     }
 
-    void currentPort()
+    void currentPortAndInvalidPorts()
     {
-        GrafPtr a = newWorld(4, 4);
-        GrafPtr b = newWorld(4, 4);
+        VelmarTest::LogCapture log;
+        World a(4);
+        World b(4);
         SetPort(a);
         GrafPtr got = nullptr;
         GetPort(&got);
-        QCOMPARE(got, a);
+        QCOMPARE(got, GrafPtr(a));
         SetGWorld(b, reinterpret_cast<void*>(0x1234)); // the device is ignored
         void* device = reinterpret_cast<void*>(0x1);
         GetGWorld(&got, &device);
-        QCOMPARE(got, b);
+        QCOMPARE(got, GrafPtr(b));
         QCOMPARE(device, nullptr);
         GetGWorld(&got, nullptr);
         GetPort(nullptr);
-        QCOMPARE(GetCurrentPort(), b);
-        DisposeGWorld(a);
+        QCOMPARE(GetCurrentPort(), GrafPtr(b));
         DisposeGWorld(b);
         QCOMPARE(GetCurrentPort(), nullptr);
-    }
-
-    void setPortRefusesInvalidPorts()
-    {
-        VelmarTest::LogCapture log;
-        GrafPtr live = newWorld(4, 4);
-        GrafPtr dead = newWorld(4, 4);
-        DisposeGWorld(dead);
-        SetPort(live);
-        SetPort(dead);
+        // A disposed port is refused and resets the current port.
+        SetPort(a);
+        SetPort(b);
         QVERIFY(log.contains(QStringLiteral("Velmar::SetPort(")));
         QVERIFY(log.contains(QStringLiteral(") reset invalid GrafPort!")));
         QCOMPARE(GetCurrentPort(), nullptr);
-        QVERIFY(!IsValidPort(dead));
+        QVERIFY(!IsValidPort(b));
         QVERIFY(!IsValidPort(nullptr));
         // Memory that merely looks like a port is not one, and is not read.
         alignas(QtGrafPort) unsigned char fake[sizeof(QtGrafPort)] = {};
         QVERIFY(!IsValidPort(reinterpret_cast<GrafPtr>(fake)));
-        SetPort(live);
+        SetPort(a);
         SetPort(reinterpret_cast<GrafPtr>(fake));
         QCOMPARE(GetCurrentPort(), nullptr);
-        QVERIFY(IsValidPort(live));
-        DisposeGWorld(live);
+        QVERIFY(IsValidPort(a));
     }
 
     void painterCap()
     {
-        std::vector<GrafPtr> ports;
+        std::vector<std::unique_ptr<World>> ports;
         for (int i = 0; i < 51; ++i) {
-            ports.push_back(newWorld(2, 2));
-            SetPort(ports.back());
-            QVERIFY(Private::portPainter(ports.back(), "test"));
+            ports.push_back(std::make_unique<World>(2));
+            QVERIFY(ports.back()->painter());
         }
         QCOMPARE(Private::activePainterCount(), 50);
-        QVERIFY(!ports.front()->isActive());
-        QVERIFY(!Private::isPainterListed(ports.front()));
+        QVERIFY(!(*ports.front())->isActive());
+        QVERIFY(!Private::isPainterListed(*ports.front()));
         for (int i = 1; i < 51; ++i)
-            QVERIFY(ports[i]->isActive());
+            QVERIFY((*ports[i])->isActive());
         // Drawing into the first again restarts it and ends the next oldest.
-        QVERIFY(Private::portPainter(ports.front(), "test"));
-        QVERIFY(!ports[1]->isActive());
+        QVERIFY(ports.front()->painter());
+        QVERIFY(!(*ports[1])->isActive());
         QCOMPARE(Private::activePainterCount(), 50);
-        for (GrafPtr p : ports)
-            DisposeGWorld(p);
+        ports.clear();
         QCOMPARE(Private::activePainterCount(), 0);
     }
 
     void painterStateSurvivesEndPaint()
     {
-        GrafPtr world = newWorld(8, 8);
-        SetPort(world);
-        QVERIFY(Private::portPainter(world, "test"));
+        World world(8);
+        QVERIFY(world.painter());
         const RGBColor green(0, 65535, 0);
         RGBForeColor(&green);
+        QCOMPARE(world->painter->pen().color(), QColor(0, 255, 0));
         PenSize(3, 3);
         PenMode(patXor);
         SetOrigin(2, 2);
@@ -157,46 +156,50 @@ private Q_SLOTS:
         GetForeColor(&c);
         QCOMPARE(quint32(c), 0xFF00FF00u);
         QCOMPARE(world->currentPen().width(), 3);
-        QVERIFY(Private::portPainter(world, "test"));
+        QVERIFY(world.painter());
         QCOMPARE(world->painter->pen().width(), 3);
         QCOMPARE(world->painter->compositionMode(), QPainter::RasterOp_NotSourceXorDestination);
         QCOMPARE(world->painter->transform(), QTransform::fromTranslate(-2, -2));
-        DisposeGWorld(world);
     }
 
+    // Each colour call reaches its own field of the port.
+    void colourGettersAndSetters()
+    {
+        World world(4);
+        const RGBColor fore(65535, 0, 0), back(0, 65535, 0), hilite(0, 0, 65535);
+        const RGBColor op(65535, 65535, 0), portOp(0, 65535, 65535);
+        RGBForeColor(&fore);
+        RGBBackColor(&back);
+        HiliteColor(&hilite);
+        OpColor(&op);
+        RGBColor c;
+        QCOMPARE(quint32(*GetPortForeColor(world, &c)), 0xFFFF0000u);
+        QCOMPARE(quint32(*GetPortBackColor(world, &c)), 0xFF00FF00u);
+        QCOMPARE(quint32(*GetPortHiliteColor(world, &c)), 0xFF0000FFu);
+        QCOMPARE(quint32(*GetPortOpColor(world, &c)), 0xFFFFFF00u);
+        SetPortOpColor(world, &portOp);
+        QCOMPARE(quint32(*GetPortOpColor(world, &c)), 0xFF00FFFFu);
+        GetBackColor(&c);
+        QCOMPARE(quint32(c), 0xFF00FF00u);
+    }
+
+    void noPortWarnings_data()
+    {
+        QTest::addColumn<int>("index");
+        for (int i = 0; i < int(std::size(kNoPortCases)); ++i)
+            QTest::newRow(kNoPortCases[i].warning) << i;
+    }
     void noPortWarnings()
     {
+        QFETCH(int, index);
         VelmarTest::LogCapture log;
-        QVERIFY(!Private::portPainter(nullptr, "FrameRect"));
-        QVERIFY(log.contains(QStringLiteral("warning: FrameRect: Can't get current port!")));
-        {
-            MakeQPainter p("PaintOval");
-            QVERIFY(!p);
-        }
-        QVERIFY(log.contains(QStringLiteral("warning: PaintOval: Can't get current port!")));
-        RGBColor c(7, 7, 7);
-        GetBackColor(&c);
-        GetForeColor(&c);
-        RGBBackColor(&c);
-        RGBForeColor(&c);
-        OpColor(&c);
-        SetCPixel(0, 0, &c);
-        QCOMPARE(c.red, (unsigned short)7);
-        QVERIFY(!GetPortPenLocation(nullptr, nullptr));
-        QCOMPARE(GetPortPenMode(nullptr), SInt16(0));
-        for (const char* text : {"warning: GetBackColor: Can't get current port !",
-                                 "warning: GetForeColor: Can't get current port!",
-                                 "warning: RGBBackColor: Can't get current port!",
-                                 "warning: RGBForeColor: Can't get current port!",
-                                 "OpColor: Can't get port", "warning: SetCPixel: cannot get Qt port",
-                                 "warning: GetPortPenLocation: cannot get Qt port",
-                                 "warning: GetPortPenMode: cannot get Qt port"})
-            QVERIFY2(log.contains(QString::fromLatin1(text)), text);
+        kNoPortCases[index].call();
+        QVERIFY(log.contains(QLatin1String(kNoPortCases[index].warning)));
         // A disabled category writes nothing.
         SetLogCategory(kLogQuickDraw, false);
         log.clear();
-        RGBForeColor(&c);
-        QVERIFY(log.lines().isEmpty());
+        kNoPortCases[index].call();
+        QCOMPARE(log.lines(), QStringList());
     }
 
     void dirtyMarkingReachesTheWindow()
@@ -236,6 +239,15 @@ private Q_SLOTS:
         QVERIFY(IsValidPort(port));
         delete port;
         QCOMPARE(GetCurrentPort(), nullptr);
+        // Offscreen worlds have no window to mark.
+        gDirty.clear();
+        World world(10);
+        {
+            MakeQPainter p("test");
+            p |= QRect(1, 1, 2, 2);
+        }
+        SetCPixel(1, 1, &red);
+        QVERIFY(gDirty.isEmpty());
     }
 
     void disposingTheCurrentPortPicksTheFrontWindow()
@@ -243,28 +255,13 @@ private Q_SLOTS:
         HookScope hooks;
         QtGrafPort* windowPort = newWindowPort(10, 10);
         gFrontPort = windowPort;
-        GrafPtr world = newWorld(4, 4);
-        SetPort(world);
-        DisposeGWorld(world);
+        {
+            World world(4);
+        }
         QCOMPARE(GetCurrentPort(), windowPort);
         gFrontPort = nullptr;
         delete windowPort;
         QCOMPARE(GetCurrentPort(), nullptr);
-    }
-
-    void offscreenPortsMarkNothing()
-    {
-        HookScope hooks;
-        GrafPtr world = newWorld(10, 10);
-        SetPort(world);
-        {
-            MakeQPainter p("test");
-            p |= QRect(1, 1, 2, 2);
-        }
-        const RGBColor red(65535, 0, 0);
-        SetCPixel(1, 1, &red);
-        QVERIFY(gDirty.isEmpty());
-        DisposeGWorld(world);
     }
 
     void cpixelRoundTrip_data()
@@ -281,8 +278,7 @@ private Q_SLOTS:
         QFETCH(int, r);
         QFETCH(int, g);
         QFETCH(int, b);
-        GrafPtr world = newWorld(4, 4);
-        SetPort(world);
+        World world(4);
         const RGBColor in(r, g, b);
         SetCPixel(2, 3, &in);
         RGBColor out;
@@ -293,13 +289,12 @@ private Q_SLOTS:
         QCOMPARE(out.red, channel8To16(channel16To8(r)));
         QCOMPARE(out.green, channel8To16(channel16To8(g)));
         QCOMPARE(out.blue, channel8To16(channel16To8(b)));
-        QCOMPARE(qAlpha(pixelAt(world, 2, 3)), 255);
+        QCOMPARE(qAlpha(world.pixel(2, 3)), 255);
         // Exactly that one pixel changed.
-        int changed = 0;
-        for (int y = 0; y < 4; ++y)
-            for (int x = 0; x < 4; ++x)
-                changed += pixelAt(world, x, y) != qRgb(255, 255, 255) ? 1 : 0;
-        QCOMPARE(changed, (r == 65535 && g == 65535 && b == 65535) ? 0 : 1);
+        QImage expected(4, 4, QImage::Format_ARGB32_Premultiplied);
+        expected.fill(Qt::white);
+        expected.setPixel(2, 3, in);
+        QCOMPARE(world.image(), expected);
         // Outside the port: no write, black read, no crash.
         SetCPixel(-1, 0, &in);
         SetCPixel(4, 4, &in);
@@ -307,56 +302,52 @@ private Q_SLOTS:
         QCOMPARE(quint32(out), 0xFF000000u);
         GetCPixel(0, 0, nullptr);
         SetCPixel(0, 0, nullptr);
-        DisposeGWorld(world);
     }
 
     void scrollRectMovesRows()
     {
-        GrafPtr world = newWorld(100, 100);
-        SetPort(world);
+        World world(100);
         // Row y gets a colour of its own.
         for (int y = 0; y < 100; ++y)
             for (int x = 0; x < 100; ++x)
-                world->image()->setPixel(x, y, qRgb(y, 255 - y, x));
+                world.image().setPixel(x, y, qRgb(y, 255 - y, x));
         const RGBColor back(0, 0, 65535);
         RGBBackColor(&back);
         const Rect r = makeRect(0, 0, 100, 100);
-        std::unique_ptr<QRegion> update(new QRegion);
-        ScrollRect(&r, 0, 10, update.get());
-        QCOMPARE(*update, QRegion(QRect(0, 0, 100, 10)));
+        QRegion update;
+        ScrollRect(&r, 0, 10, &update);
+        QCOMPARE(update, QRegion(QRect(0, 0, 100, 10)));
         for (int y = 10; y < 100; ++y)
             for (int x = 0; x < 100; x += 33)
-                QCOMPARE(pixelAt(world, x, y), qRgb(y - 10, 255 - (y - 10), x));
+                QCOMPARE(world.pixel(x, y), qRgb(y - 10, 255 - (y - 10), x));
         for (int y = 0; y < 10; ++y)
-            QCOMPARE(pixelAt(world, 50, y), qRgb(0, 0, 255));
+            QCOMPARE(world.pixel(50, y), qRgb(0, 0, 255));
 
         // Left by 5 inside a sub-rectangle: columns outside it stay.
-        const QRgb outside = pixelAt(world, 80, 50);
+        const QRgb outside = world.pixel(80, 50);
         const Rect sub = makeRect(10, 20, 60, 70);
-        ScrollRect(&sub, -5, 0, update.get());
-        QCOMPARE(*update, QRegion(QRect(55, 20, 5, 50)));
-        QCOMPARE(pixelAt(world, 10, 30), qRgb(20, 235, 15));
-        QCOMPARE(pixelAt(world, 54, 30), qRgb(20, 235, 59));
-        QCOMPARE(pixelAt(world, 55, 30), qRgb(0, 0, 255));
-        QCOMPARE(pixelAt(world, 80, 50), outside);
-        QCOMPARE(pixelAt(world, 9, 30), qRgb(20, 235, 9));
+        ScrollRect(&sub, -5, 0, &update);
+        QCOMPARE(update, QRegion(QRect(55, 20, 5, 50)));
+        QCOMPARE(world.pixel(10, 30), qRgb(20, 235, 15));
+        QCOMPARE(world.pixel(54, 30), qRgb(20, 235, 59));
+        QCOMPARE(world.pixel(55, 30), qRgb(0, 0, 255));
+        QCOMPARE(world.pixel(80, 50), outside);
+        QCOMPARE(world.pixel(9, 30), qRgb(20, 235, 9));
 
         // No offset: empty update region, pixels untouched.
-        *update = QRegion(0, 0, 5, 5);
-        ScrollRect(&sub, 0, 0, update.get());
-        QVERIFY(update->isEmpty());
+        update = QRegion(0, 0, 5, 5);
+        ScrollRect(&sub, 0, 0, &update);
+        QVERIFY(update.isEmpty());
         // Scrolling by more than the rectangle erases all of it.
-        ScrollRect(&sub, 0, 200, update.get());
-        QCOMPARE(*update, QRegion(QRect(10, 20, 50, 50)));
-        QCOMPARE(pixelAt(world, 30, 60), qRgb(0, 0, 255));
-        DisposeGWorld(world);
+        ScrollRect(&sub, 0, 200, &update);
+        QCOMPARE(update, QRegion(QRect(10, 20, 50, 50)));
+        QCOMPARE(world.pixel(30, 60), qRgb(0, 0, 255));
     }
 
     void scrollRectBadInput()
     {
         VelmarTest::ScriptedAutomationListener answers;
-        GrafPtr world = newWorld(10, 10);
-        SetPort(world);
+        World world(10);
         QRegion update;
         ScrollRect(nullptr, 1, 1, &update);
         const Rect r = makeRect(0, 0, 10, 10);
@@ -368,81 +359,38 @@ private Q_SLOTS:
         update = QRegion(0, 0, 3, 3);
         ScrollRect(&r, 1, 1, &update);
         QVERIFY(update.isEmpty());
-        DisposeGWorld(world);
-    }
-
-    void colourState()
-    {
-        GrafPtr world = newWorld(4, 4);
-        SetPort(world);
-        RGBColor c;
-        GetPortOpColor(world, &c);
-        QCOMPARE(quint32(c), 0xFF000000u);
-        const RGBColor op(0x1111, 0x2222, 0x3333);
-        SetPortOpColor(world, &op);
-        GetPortOpColor(world, &c);
-        QCOMPARE(c.red >> 8, 0x11);
-        const RGBColor back(0, 65535, 0);
-        RGBBackColor(&back);
-        GetPortBackColor(world, &c);
-        QCOMPARE(quint32(c), 0xFF00FF00u);
-        const RGBColor hilite(65535, 0, 65535);
-        HiliteColor(&hilite);
-        GetPortHiliteColor(world, &c);
-        QCOMPARE(quint32(c), 0xFFFF00FFu);
-        // The foreground colour follows the pen, whether or not a painter is active.
-        const RGBColor fore(65535, 0, 0);
-        RGBForeColor(&fore);
-        GetPortForeColor(world, &c);
-        QCOMPARE(quint32(c), 0xFFFF0000u);
-        QVERIFY(Private::portPainter(world, "test"));
-        const RGBColor fore2(0, 0, 65535);
-        RGBForeColor(&fore2);
-        QCOMPARE(world->painter->pen().color(), QColor(0, 0, 255));
-        GetForeColor(&c);
-        QCOMPARE(quint32(c), 0xFF0000FFu);
-        Point pt;
-        world->penX = 3;
-        world->penY = 2;
-        QCOMPARE(GetPortPenLocation(world, &pt), &pt);
-        QCOMPARE(pt.h, SInt16(3));
-        QCOMPARE(pt.v, SInt16(2));
-        QCOMPARE(GetPortPenMode(world), SInt16(patCopy));
-        DisposeGWorld(world);
     }
 
     void clipAndVisibleRegions()
     {
-        GrafPtr world = newWorld(20, 20);
-        SetPort(world);
+        World world(20);
         QRegion rgn;
         QCOMPARE(*GetPortVisibleRegion(world, &rgn), QRegion(QRect(0, 0, 20, 20)));
         QRegion clip(QRect(5, 5, 5, 5));
         SetPortClipRegion(world, &clip);
         QCOMPARE(world->clipInForce, UInt8(1));
-        QPainter* p = Private::portPainter(world, "test");
+        QPainter* p = world.painter();
         p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::red));
-        QCOMPARE(pixelAt(world, 4, 4), qRgb(255, 255, 255));
-        QCOMPARE(pixelAt(world, 5, 5), qRgb(255, 0, 0));
-        QCOMPARE(pixelAt(world, 10, 10), qRgb(255, 255, 255));
+        QCOMPARE(world.pixel(4, 4), qRgb(255, 255, 255));
+        QCOMPARE(world.pixel(5, 5), qRgb(255, 0, 0));
+        QCOMPARE(world.pixel(10, 10), qRgb(255, 255, 255));
         {
             SavePortVisibleRegion saved;
             QCOMPARE(*saved.clip(), clip);
             QRegion visible(QRect(0, 0, 6, 6));
             SetPortVisibleRegion(world, &visible);
             p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::blue));
-            QCOMPARE(pixelAt(world, 5, 5), qRgb(0, 0, 255));
-            QCOMPARE(pixelAt(world, 6, 6), qRgb(255, 0, 0));
+            QCOMPARE(world.pixel(5, 5), qRgb(0, 0, 255));
+            QCOMPARE(world.pixel(6, 6), qRgb(255, 0, 0));
         }
         // Restored: the whole clip square is reachable again.
         QCOMPARE(world->visibleRegion, QRegion(QRect(0, 0, 20, 20)));
         p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::green));
-        QCOMPARE(pixelAt(world, 9, 9), qRgb(0, 255, 0));
-        QCOMPARE(pixelAt(world, 4, 4), qRgb(255, 255, 255));
+        QCOMPARE(world.pixel(9, 9), qRgb(0, 255, 0));
+        QCOMPARE(world.pixel(4, 4), qRgb(255, 255, 255));
         SetPortVisibleRegion(nullptr, &rgn);
         SetPortVisibleRegion(world, nullptr);
         QCOMPARE(*GetPortClipRegion(world, &rgn), clip);
-        DisposeGWorld(world);
     }
 };
 
