@@ -39,6 +39,20 @@ UInt16 scaledFraction(qreal fraction)
     return static_cast<UInt16>(static_cast<int>(fraction * 65535.0));
 }
 
+// Hue and saturation are the HSV ones in both models, as the Toolbox callers expect; only the
+// third component differs.
+template <typename Model, typename Component, typename Fraction>
+void fromRgb(const RGBColor* rgb, Model* out, Component Model::*third,
+             Fraction (QColor::*thirdF)() const)
+{
+    if (!rgb || !out)
+        return;
+    const QColor c = static_cast<QColor>(*rgb);
+    out->hue = scaledFraction(c.hueF());
+    out->saturation = scaledFraction(c.saturationF());
+    out->*third = scaledFraction((c.*thirdF)());
+}
+
 } // namespace
 
 namespace Private {
@@ -91,10 +105,8 @@ void LMSetHiliteMode(unsigned char mode)
 
 void HSV2RGB(const HSVColor* hsv, RGBColor* rgb)
 {
-    if (!hsv && !rgb)
-        return;
     if (!hsv || !rgb)
-        return; // a caller error; nothing sensible to convert
+        return;
     const QColor c = QColor::fromHsvF(hsv->hue / 65535.0f, hsv->saturation / 65535.0f,
                                       hsv->value / 65535.0f, 1.0f)
                          .toRgb();
@@ -103,23 +115,12 @@ void HSV2RGB(const HSVColor* hsv, RGBColor* rgb)
 
 void RGB2HSV(const RGBColor* rgb, HSVColor* hsv)
 {
-    if (!rgb || !hsv)
-        return;
-    const QColor c = static_cast<QColor>(*rgb);
-    hsv->hue = scaledFraction(c.hueF());
-    hsv->saturation = scaledFraction(c.saturationF());
-    hsv->value = scaledFraction(c.valueF());
+    fromRgb(rgb, hsv, &HSVColor::value, &QColor::valueF);
 }
 
 void RGB2HSL(const RGBColor* rgb, HSLColor* hsl)
 {
-    if (!rgb || !hsl)
-        return;
-    const QColor c = static_cast<QColor>(*rgb);
-    // Hue and saturation are the HSV ones here too, as the Toolbox callers expect.
-    hsl->hue = scaledFraction(c.hueF());
-    hsl->saturation = scaledFraction(c.saturationF());
-    hsl->lightness = scaledFraction(c.lightnessF());
+    fromRgb(rgb, hsl, &HSLColor::lightness, &QColor::lightnessF);
 }
 
 void InvertColor(RGBColor* color)

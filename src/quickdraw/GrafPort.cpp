@@ -202,13 +202,25 @@ void QtGrafPort::EndPaint()
 
 // ---- State that lives in the painter while it is active ------------------------------------
 
+namespace {
+
+// While the painter is active it holds the state; otherwise `saved` keeps it for BeginPaint.
+template <typename Value, typename Setter>
+void holdState(QPainter* painter, bool active, Setter set, Value& saved, const Value& value)
+{
+    if (active)
+        (painter->*set)(value);
+    else
+        saved = value;
+}
+
+} // namespace
+
 void QtGrafPort::setPen(const QPen& pen)
 {
     ++inkSerial;
-    if (m_painterActive)
-        painter->setPen(pen);
-    else
-        painterState.pen = pen;
+    holdState(painter, m_painterActive, qOverload<const QPen&>(&QPainter::setPen),
+              painterState.pen, pen);
 }
 
 void QtGrafPort::setForeColor(const QColor& color)
@@ -228,36 +240,27 @@ void QtGrafPort::setForeColor(const QColor& color)
 void QtGrafPort::setBrush(const QBrush& brush)
 {
     ++inkSerial;
-    if (m_painterActive)
-        painter->setBrush(brush);
-    else
-        painterState.brush = brush;
+    holdState(painter, m_painterActive, qOverload<const QBrush&>(&QPainter::setBrush),
+              painterState.brush, brush);
 }
 
 void QtGrafPort::setBackground(const QBrush& brush)
 {
     ++inkSerial;
-    if (m_painterActive)
-        painter->setBackground(brush);
-    else
-        painterState.background = brush;
+    holdState(painter, m_painterActive, &QPainter::setBackground, painterState.background,
+              brush);
 }
 
 void QtGrafPort::setCompositionMode(QPainter::CompositionMode mode)
 {
     ++inkSerial;
-    if (m_painterActive)
-        painter->setCompositionMode(mode);
-    else
-        painterState.compositionMode = mode;
+    holdState(painter, m_painterActive, &QPainter::setCompositionMode,
+              painterState.compositionMode, mode);
 }
 
 void QtGrafPort::setFont(const QFont& font)
 {
-    if (m_painterActive)
-        painter->setFont(font);
-    else
-        painterState.font = font;
+    holdState(painter, m_painterActive, &QPainter::setFont, painterState.font, font);
 }
 
 // ---- Geometry and clip ----------------------------------------------------------------------

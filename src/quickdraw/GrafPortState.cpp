@@ -25,6 +25,18 @@ bool checkPort(GrafPtr port, const char* function)
     return false;
 }
 
+// The colour setters of the current port: without a port they log `noPortWarning` (a fixed
+// text); a null colour changes nothing.
+template <typename Store>
+void setCurrentPortColor(const RGBColor* color, const char* noPortWarning, Store store)
+{
+    QtGrafPort* port = gCurrentGrafPort;
+    if (!port)
+        warnNoPort(noPortWarning);
+    else if (color)
+        store(port, static_cast<QColor>(*color));
+}
+
 } // namespace
 
 RGBColor* GetPortBackColor(GrafPtr port, RGBColor* color)
@@ -71,48 +83,29 @@ void GetForeColor(RGBColor* color)
 
 void RGBBackColor(const RGBColor* color)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("warning: RGBBackColor: Can't get current port!");
-        return;
-    }
-    if (color) {
-        port->backColor = static_cast<QColor>(*color);
-        port->inkChanged();
-    }
+    setCurrentPortColor(color, "warning: RGBBackColor: Can't get current port!",
+                        [](QtGrafPort* port, const QColor& c) {
+                            port->backColor = c;
+                            port->inkChanged();
+                        });
 }
 
 void RGBForeColor(const RGBColor* color)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("warning: RGBForeColor: Can't get current port!");
-        return;
-    }
-    if (color)
-        port->setForeColor(static_cast<QColor>(*color));
+    setCurrentPortColor(color, "warning: RGBForeColor: Can't get current port!",
+                        [](QtGrafPort* port, const QColor& c) { port->setForeColor(c); });
 }
 
 void OpColor(const RGBColor* color)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("OpColor: Can't get port");
-        return;
-    }
-    if (color)
-        port->opColor = static_cast<QColor>(*color);
+    setCurrentPortColor(color, "OpColor: Can't get port",
+                        [](QtGrafPort* port, const QColor& c) { port->opColor = c; });
 }
 
 void HiliteColor(const RGBColor* color)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("warning: HiliteColor: Can't get current port!");
-        return;
-    }
-    if (color)
-        port->hiliteColor = static_cast<QColor>(*color);
+    setCurrentPortColor(color, "warning: HiliteColor: Can't get current port!",
+                        [](QtGrafPort* port, const QColor& c) { port->hiliteColor = c; });
 }
 
 Point* GetPortPenLocation(GrafPtr port, Point* location)
