@@ -162,8 +162,9 @@ private Q_SLOTS:
         QCOMPARE(world->painter->transform(), QTransform::fromTranslate(-2, -2));
     }
 
-    // Each colour call reaches its own field of the port.
-    void colourGettersAndSetters()
+    // Each colour call reaches its own field of the port; the pen location getter is not
+    // transposed.
+    void portStateGettersAndSetters()
     {
         World world(4);
         const RGBColor fore(65535, 0, 0), back(0, 65535, 0), hilite(0, 0, 65535);
@@ -181,6 +182,12 @@ private Q_SLOTS:
         QCOMPARE(quint32(*GetPortOpColor(world, &c)), 0xFF00FFFFu);
         GetBackColor(&c);
         QCOMPARE(quint32(c), 0xFF00FF00u);
+        Point pt;
+        world->penX = 3;
+        world->penY = 2;
+        QCOMPARE(GetPortPenLocation(world, &pt), &pt);
+        QCOMPARE(pt.h, SInt16(3));
+        QCOMPARE(pt.v, SInt16(2));
     }
 
     void noPortWarnings_data()
