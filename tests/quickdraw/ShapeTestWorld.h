@@ -1,5 +1,8 @@
-// An offscreen world made current for the shape and region tests, with pixel read-back.
+// Shared helpers of the shape and region tests: an offscreen world made current, with pixel
+// read-back, owned regions, recorded polygons and the assertion check.
 #pragma once
+
+#include "TestSupport.h"
 
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
@@ -7,13 +10,24 @@
 #include <Velmar/QuickDraw.h>
 
 #include <QImage>
+#include <QPolygon>
 #include <QSet>
+
+#include <memory>
 
 namespace ShapeTest {
 
 inline Rect R(int top, int left, int bottom, int right)
 {
     return Rect{std::int16_t(top), std::int16_t(left), std::int16_t(bottom), std::int16_t(right)};
+}
+
+inline Point P(int h, int v)
+{
+    Point p;
+    p.h = std::int16_t(h);
+    p.v = std::int16_t(v);
+    return p;
 }
 
 // A white world of the given size at (0, 0), current while it lives; the previous port
@@ -36,28 +50,23 @@ public:
     World& operator=(const World&) = delete;
 
     Velmar::GrafPtr port() const { return m_port; }
-
-    // The image as drawn so far (the painter is ended so that everything has landed).
-    QImage image() const
+    // The pixel as drawn so far (the painter is ended so that everything has landed).
+    QRgb pixel(int x, int y) const
     {
         m_port->EndPaint();
-        return m_port->image()->copy();
+        return m_port->image()->pixel(x, y);
     }
     // Every pixel that is not the given colour, as (x, y) points.
     QSet<QPoint> touched(QRgb background = 0xFFFFFFFF) const
     {
-        const QImage img = image();
+        m_port->EndPaint();
+        const QImage& img = *m_port->image();
         QSet<QPoint> out;
         for (int y = 0; y < img.height(); ++y)
             for (int x = 0; x < img.width(); ++x)
                 if (img.pixel(x, y) != background)
                     out.insert(QPoint(x, y));
         return out;
-    }
-    QRgb pixel(int x, int y) const
-    {
-        m_port->EndPaint();
-        return m_port->image()->pixel(x, y);
     }
 
 private:
@@ -76,14 +85,54 @@ inline QSet<QPoint> regionPixels(const QRegion& region)
     return out;
 }
 
+// The pixels of a rectangle given by its Toolbox edges, and of a frame w deep inside it.
+inline QSet<QPoint> rectPixels(int left, int top, int right, int bottom)
+{
+    return regionPixels(QRegion(QRect(QPoint(left, top), QPoint(right - 1, bottom - 1))));
+}
+inline QSet<QPoint> framePixels(int left, int top, int right, int bottom, int w)
+{
+    return rectPixels(left, top, right, bottom) - rectPixels(left + w, top + w, right - w, bottom - w);
+}
+
 inline QByteArray describe(const QSet<QPoint>& pixels)
 {
     QRect box;
     for (const QPoint& p : pixels)
         box |= QRect(p, QSize(1, 1));
-    return "count " + QByteArray::number(pixels.size()) + " box " + QByteArray::number(box.x())
-        + "," + QByteArray::number(box.y()) + " " + QByteArray::number(box.width()) + "x"
+    return QByteArray::number(pixels.size()) + " pixels in " + QByteArray::number(box.x()) + ","
+        + QByteArray::number(box.y()) + " " + QByteArray::number(box.width()) + "x"
         + QByteArray::number(box.height());
+}
+
+struct RgnDeleter {
+    void operator()(QRegion* r) const { Velmar::DisposeRgn(r); }
+};
+using Rgn = std::unique_ptr<QRegion, RgnDeleter>;
+
+inline Rgn rgnOf(const QRegion& region = QRegion())
+{
+    Rgn r(Velmar::NewRgn());
+    *r = region;
+    return r;
+}
+
+// A polygon recorded with OpenPoly: MoveTo the first point, LineTo the others.
+inline Velmar::PolyPtr* recordPoly(const QList<QPoint>& points)
+{
+    Velmar::PolyPtr* poly = Velmar::OpenPoly();
+    for (qsizetype i = 0; i < points.size(); ++i)
+        (i ? Velmar::LineTo : Velmar::MoveTo)(short(points[i].x()), short(points[i].y()));
+    Velmar::ClosePoly();
+    return poly;
+}
+
+inline bool assertedWith(const VelmarTest::ScriptedAutomationListener& l, const char* expression)
+{
+    for (const auto& q : l.questions())
+        if (q.text.contains(QString::fromLatin1(expression)))
+            return true;
+    return false;
 }
 
 } // namespace ShapeTest

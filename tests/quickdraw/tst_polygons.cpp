@@ -1,41 +1,11 @@
 // Polygons: recording with OpenPoly/ClosePoly, drawing under the odd-even rule, and misuse
 // (nested opens, closing without opening, killing an open polygon, too few points).
-#include "TestSupport.h"
-
 #include "ShapeTestWorld.h"
 
 #include <Velmar/Diagnostics.h>
 
-#include <QPolygon>
-
 using namespace Velmar;
 using namespace ShapeTest;
-
-namespace {
-
-// A five-pointed star drawn in one stroke: its centre is enclosed twice.
-PolyPtr* star()
-{
-    PolyPtr* poly = OpenPoly();
-    MoveTo(50, 5);
-    LineTo(79, 95);
-    LineTo(2, 39);
-    LineTo(98, 39);
-    LineTo(21, 95);
-    LineTo(50, 5);
-    ClosePoly();
-    return poly;
-}
-
-bool assertedWith(const VelmarTest::ScriptedAutomationListener& l, const char* expression)
-{
-    for (const auto& q : l.questions())
-        if (q.text.contains(QString::fromLatin1(expression)))
-            return true;
-    return false;
-}
-
-} // namespace
 
 class TestPolygons : public QObject {
     Q_OBJECT
@@ -72,7 +42,9 @@ private Q_SLOTS:
     void paintPolyUsesOddEvenRule()
     {
         World world;
-        PolyPtr* poly = star();
+        // A five-pointed star drawn in one stroke: its centre is enclosed twice.
+        PolyPtr* poly = recordPoly({QPoint(50, 5), QPoint(79, 95), QPoint(2, 39), QPoint(98, 39),
+                                    QPoint(21, 95), QPoint(50, 5)});
         PaintPoly(poly);
         const QSet<QPoint> got = world.touched();
         QVERIFY(got.contains(QPoint(50, 20)));  // a point of the star
@@ -83,15 +55,10 @@ private Q_SLOTS:
         KillPoly(poly);
     }
 
-    void offsetPolyAndErase()
+    void offsetEraseFillFrame()
     {
         World world;
-        PolyPtr* poly = OpenPoly();
-        MoveTo(0, 0);
-        LineTo(20, 0);
-        LineTo(20, 20);
-        LineTo(0, 20);
-        ClosePoly();
+        PolyPtr* poly = recordPoly({QPoint(0, 0), QPoint(20, 0), QPoint(20, 20), QPoint(0, 20)});
         OffsetPoly(poly, 30, 40);
         QCOMPARE(poly->qPoly->boundingRect(), QRect(30, 40, 21, 21));
         const Rect all = R(0, 0, 100, 100);
@@ -102,17 +69,9 @@ private Q_SLOTS:
         FillPoly(poly, GetQDGlobalsBlack(nullptr));
         QVERIFY(world.pixel(40, 50) == qRgb(0, 0, 0));
         KillPoly(poly);
-    }
 
-    void framePolyStrokesTheOutline()
-    {
-        World world;
-        PolyPtr* poly = OpenPoly();
-        MoveTo(10, 10);
-        LineTo(30, 10);
-        LineTo(30, 30);
-        LineTo(10, 10);
-        ClosePoly();
+        EraseRect(&all);
+        poly = recordPoly({QPoint(10, 10), QPoint(30, 10), QPoint(30, 30), QPoint(10, 10)});
         FramePoly(poly);
         const QSet<QPoint> got = world.touched();
         QVERIFY(got.contains(QPoint(20, 10)));
@@ -122,30 +81,22 @@ private Q_SLOTS:
         KillPoly(poly);
     }
 
-    void fewPointsDrawNothing_data()
-    {
-        QTest::addColumn<int>("points");
-        QTest::newRow("0") << 0;
-        QTest::newRow("1") << 1;
-        QTest::newRow("2") << 2;
-    }
     void fewPointsDrawNothing()
     {
-        QFETCH(int, points);
-        World world;
-        PolyPtr* poly = OpenPoly();
-        for (int i = 0; i < points; ++i)
-            LineTo(short(10 + 20 * i), short(10 + 7 * i));
-        ClosePoly();
-        PaintPoly(poly);
-        ErasePoly(poly);
-        InvertPoly(poly);
-        QVERIFY(world.touched().isEmpty());
-        FramePoly(poly); // may draw the segment, never crashes
-        const Rect box = GetPolyBBox(poly);
-        if (points == 0)
-            QVERIFY(box.left == 0 && box.top == 0 && box.right == 0 && box.bottom == 0);
-        KillPoly(poly);
+        for (const QList<QPoint>& points :
+             {QList<QPoint>{}, {QPoint(10, 10)}, {QPoint(10, 10), QPoint(30, 17)}}) {
+            World world;
+            PolyPtr* poly = recordPoly(points);
+            PaintPoly(poly);
+            ErasePoly(poly);
+            InvertPoly(poly);
+            QVERIFY(world.touched().isEmpty());
+            FramePoly(poly); // may draw the segment, never crashes
+            const Rect box = GetPolyBBox(poly);
+            if (points.isEmpty())
+                QVERIFY(box.left == 0 && box.top == 0 && box.right == 0 && box.bottom == 0);
+            KillPoly(poly);
+        }
     }
 
     void nullPolygonsAreSafe()
@@ -183,25 +134,14 @@ private Q_SLOTS:
         KillPoly(second);
     }
 
-    void closeWithoutOpenIsLogged()
+    // Closing without opening is logged; killing the open polygon stops the recording, so
+    // that later lines draw instead of writing into freed memory.
+    void closeWithoutOpenAndKillWhileOpen()
     {
         World world;
         VelmarTest::LogCapture log;
         ClosePoly();
         QVERIFY(log.contains("ClosePoly"));
-        GrafPtr saved = world.port();
-        SetPort(nullptr);
-        ClosePoly();
-        QVERIFY(log.contains("warning: ClosePoly: cannot get current port"));
-        SetPort(saved);
-    }
-
-    // Killing the open polygon stops the recording; later lines draw instead of writing
-    // into freed memory.
-    void killWhileOpenStopsRecording()
-    {
-        World world;
-        VelmarTest::LogCapture log;
         PolyPtr* poly = OpenPoly();
         LineTo(5, 5);
         KillPoly(poly);
@@ -212,13 +152,16 @@ private Q_SLOTS:
         QCOMPARE(world.touched().size(), 10);
     }
 
-    void openPolyWithoutPortGivesAPolygonThatRecordsNothing()
+    void withoutPort()
     {
         GrafPtr saved = nullptr;
         GetPort(&saved);
         SetPort(nullptr);
+        VelmarTest::LogCapture log;
+        ClosePoly();
+        QVERIFY(log.contains("warning: ClosePoly: cannot get current port"));
         VelmarTest::ScriptedAutomationListener listener({}, QStringLiteral("Ignore"));
-        PolyPtr* poly = OpenPoly();
+        PolyPtr* poly = OpenPoly(); // a polygon that records nothing
         QVERIFY(assertedWith(listener, "!!port"));
         QVERIFY(poly && poly->qPoly && poly->qPoly->isEmpty());
         KillPoly(poly);

@@ -1,29 +1,20 @@
-// Region handles and arithmetic, checked by set identities and exact pixel sets
-// rather than by restating the calls.
-#include "TestSupport.h"
+// Region handles and arithmetic, checked by set identities and exact pixel sets rather than
+// by restating the calls.
+#include "ShapeTestWorld.h"
 
 #include <Velmar/Diagnostics.h>
-#include <Velmar/QDRegions.h>
 
+#include <QBitArray>
 #include <QRandomGenerator>
-#include <QRegion>
-
-#include <memory>
 
 using namespace Velmar;
+using namespace ShapeTest;
 
 namespace {
 
-struct RgnDeleter {
-    void operator()(QRegion* r) const { DisposeRgn(r); }
-};
-using Rgn = std::unique_ptr<QRegion, RgnDeleter>;
-
-Rgn make() { return Rgn(NewRgn()); }
-
 Rgn rectRgn(int left, int top, int right, int bottom)
 {
-    Rgn r = make();
+    Rgn r = rgnOf();
     SetRectRgn(r.get(), short(left), short(top), short(right), short(bottom));
     return r;
 }
@@ -31,7 +22,7 @@ Rgn rectRgn(int left, int top, int right, int bottom)
 // A region made of a few random rectangles inside a 40x40 box.
 Rgn randomRgn(QRandomGenerator& gen)
 {
-    Rgn r = make();
+    Rgn r = rgnOf();
     const int n = 1 + gen.bounded(5);
     for (int i = 0; i < n; ++i) {
         const int l = gen.bounded(40), t = gen.bounded(40);
@@ -39,14 +30,6 @@ Rgn randomRgn(QRandomGenerator& gen)
         UnionRgn(r.get(), part.get(), r.get());
     }
     return r;
-}
-
-Point P(int h, int v)
-{
-    Point p;
-    p.h = std::int16_t(h);
-    p.v = std::int16_t(v);
-    return p;
 }
 
 // The pixels of a region inside a box, as a bit set, asked through PtInRgn.
@@ -59,11 +42,19 @@ QBitArray pixels(RgnHandle r, int size = 64, int origin = -12)
     return bits;
 }
 
-Rect bounds(RgnHandle r)
+// InsetRgn by its definition: |d| one-pixel steps, each intersecting (shrink) or uniting
+// (grow) the region with itself moved a pixel either way.
+QRegion insetByDefinition(QRegion r, int dh, int dv)
 {
-    Rect b{};
-    GetRegionBounds(r, &b);
-    return b;
+    for (int i = 0; i < std::abs(dh); ++i) {
+        const QRegion a = r.translated(-1, 0), b = r.translated(1, 0);
+        r = dh > 0 ? (r & a & b) : (r | a | b);
+    }
+    for (int i = 0; i < std::abs(dv); ++i) {
+        const QRegion a = r.translated(0, -1), b = r.translated(0, 1);
+        r = dv > 0 ? (r & a & b) : (r | a | b);
+    }
+    return r;
 }
 
 } // namespace
@@ -75,15 +66,15 @@ private Q_SLOTS:
 
     void lifetimeAndContent()
     {
-        Rgn r = make();
+        Rgn r = rgnOf();
         QVERIFY(EmptyRgn(r.get()));
         const Rect rect{10, 20, 30, 60};
         RectRgn(r.get(), &rect);
-        QVERIFY(!EmptyRgn(r.get()));
-        QCOMPARE(r->boundingRect(), QRect(20, 10, 40, 20)); // exactly the Toolbox pixels
-        const Rect b = bounds(r.get());
+        QCOMPARE(*r, QRegion(20, 10, 40, 20)); // exactly the Toolbox pixels
+        Rect b{};
+        GetRegionBounds(r.get(), &b);
         QVERIFY(b.top == 10 && b.left == 20 && b.bottom == 30 && b.right == 60);
-        Rgn copy = make();
+        Rgn copy = rgnOf();
         CopyRgn(r.get(), copy.get());
         QVERIFY(EqualRgn(r.get(), copy.get()));
         SetEmptyRgn(r.get());
@@ -134,9 +125,9 @@ private Q_SLOTS:
     void setIdentities()
     {
         QRandomGenerator gen(1234);
-        for (int round = 0; round < 60; ++round) {
+        for (int round = 0; round < 30; ++round) {
             Rgn a = randomRgn(gen), b = randomRgn(gen);
-            Rgn u = make(), s = make(), d = make(), x = make(), t = make();
+            Rgn u = rgnOf(), s = rgnOf(), d = rgnOf(), x = rgnOf(), t = rgnOf();
             UnionRgn(a.get(), b.get(), u.get());
             SectRgn(a.get(), b.get(), s.get());
             DiffRgn(a.get(), b.get(), d.get());
@@ -159,17 +150,6 @@ private Q_SLOTS:
             QCOMPARE(PtInRgn(P(7, -3), t.get()), PtInRgn(P(0, 0), a.get()));
             OffsetRgn(t.get(), -7, 3);
             QVERIFY(EqualRgn(t.get(), a.get()));
-            // Growing then shrinking by the same amount contains the original.
-            CopyRgn(a.get(), t.get());
-            InsetRgn(t.get(), -2, -2);
-            InsetRgn(t.get(), 2, 2);
-            DiffRgn(a.get(), t.get(), s.get());
-            QVERIFY(EmptyRgn(s.get()));
-            // Shrinking keeps only pixels of the original.
-            CopyRgn(a.get(), t.get());
-            InsetRgn(t.get(), 1, 1);
-            DiffRgn(t.get(), a.get(), s.get());
-            QVERIFY(EmptyRgn(s.get()));
             // The destination may be one of the sources.
             CopyRgn(a.get(), t.get());
             UnionRgn(t.get(), b.get(), t.get());
@@ -200,90 +180,26 @@ private Q_SLOTS:
         QCOMPARE(*r, expected.isNull() ? QRegion() : QRegion(expected));
     }
 
-    // On a rectangle, insetting a region is insetting the rectangle, both ways round.
-    void insetRgnMatchesInsetRectAndRoundTrips()
+    // Against the step-by-step definition: random regions (many rectangles, far-apart pieces)
+    // and an L shape (its inner corner) by small and absurd amounts, which take the fast path.
+    void insetRgnMatchesDefinition()
     {
-        for (int d = -3; d <= 3; ++d) {
-            Rgn r = rectRgn(5, 7, 25, 19);
-            InsetRgn(r.get(), short(d), short(d));
-            QCOMPARE(r->boundingRect(), QRect(5 + d, 7 + d, 20 - 2 * d, 12 - 2 * d));
-            QCOMPARE(r->rectCount(), 1);
-            InsetRgn(r.get(), short(-d), short(-d));
-            Rgn original = rectRgn(5, 7, 25, 19);
-            QVERIFY(EqualRgn(r.get(), original.get()));
-        }
-    }
-
-    // Far-apart pieces grow and shrink independently: the many-rectangle path agrees with
-    // the single-rectangle one.
-    void insetRgnOfSeparatePieces()
-    {
-        for (int d = -12; d <= 6; ++d) {
-            Rgn both = rectRgn(0, 0, 10, 12);
-            Rgn far = rectRgn(80, 80, 100, 98);
-            UnionRgn(both.get(), far.get(), both.get());
-            Rgn a = rectRgn(0, 0, 10, 12);
-            InsetRgn(a.get(), short(d), short(d));
-            InsetRgn(far.get(), short(d), short(d));
-            InsetRgn(both.get(), short(d), short(d));
-            UnionRgn(a.get(), far.get(), a.get());
-            QVERIFY2(EqualRgn(both.get(), a.get()), QByteArray::number(d));
-        }
-    }
-
-    // Against the one-pixel-at-a-time definition, on random regions.
-    void insetRgnMatchesStepByStepDefinition()
-    {
-        const auto reference = [](QRegion r, int dh, int dv) {
-            for (int i = 0; i < std::abs(dh); ++i) {
-                const QRegion a = r.translated(-1, 0), b = r.translated(1, 0);
-                r = dh > 0 ? (r & a & b) : (r | a | b);
-            }
-            for (int i = 0; i < std::abs(dv); ++i) {
-                const QRegion a = r.translated(0, -1), b = r.translated(0, 1);
-                r = dv > 0 ? (r & a & b) : (r | a | b);
-            }
-            return r;
-        };
+        const QRegion lShape = QRegion(0, 0, 30, 8).united(QRegion(0, 0, 8, 30));
+        QList<std::tuple<QRegion, int, int>> cases = {
+            {lShape, 1, 1}, {lShape, -1, -1}, {lShape, -100, -100}, {lShape, -3000, -3000},
+            {lShape, 3, -2}, {lShape.united(QRegion(80, 80, 20, 18)), -12, 6}};
         QRandomGenerator gen(99);
         for (int round = 0; round < 40; ++round) {
             Rgn r = randomRgn(gen);
             const int dh = gen.bounded(-9, 10), dv = gen.bounded(-9, 10);
-            const QRegion expected = reference(*r, dh, dv);
+            cases.append({*r, dh, dv});
+        }
+        for (const auto& [region, dh, dv] : cases) {
+            Rgn r = rgnOf(region);
             InsetRgn(r.get(), short(dh), short(dv));
-            QVERIFY2(*r == expected, QByteArray::number(dh) + "," + QByteArray::number(dv));
+            QVERIFY2(*r == insetByDefinition(region, dh, dv),
+                     QByteArray::number(dh) + "," + QByteArray::number(dv));
         }
-    }
-
-    // Growing an L shape by d is growing each of its arms by d; shrinking it back by d
-    // restores it (its corners are convex or the inner corner of two rectangles).
-    void insetRgnGrowsLShapeArmByArm()
-    {
-        for (int d : {1, 2, 3, 5, 8, 13, 100, 3000}) {
-            Rgn l = rectRgn(0, 0, 30, 8);
-            Rgn leg = rectRgn(0, 0, 8, 30);
-            UnionRgn(l.get(), leg.get(), l.get());
-            InsetRgn(l.get(), short(-d), short(-d));
-            const QRegion expected = QRegion(-d, -d, 30 + 2 * d, 8 + 2 * d)
-                                         .united(QRegion(-d, -d, 8 + 2 * d, 30 + 2 * d));
-            QVERIFY2(*l == expected, QByteArray::number(d));
-            InsetRgn(l.get(), short(d), short(d));
-            Rgn original = rectRgn(0, 0, 30, 8);
-            Rgn arm = rectRgn(0, 0, 8, 30);
-            UnionRgn(original.get(), arm.get(), original.get());
-            QVERIFY2(EqualRgn(l.get(), original.get()), QByteArray::number(d));
-        }
-    }
-
-    // An L shape: shrinking removes a pixel from every boundary, including the inner corner.
-    void insetRgnOfLShape()
-    {
-        Rgn l = rectRgn(0, 0, 10, 4);
-        Rgn leg = rectRgn(0, 0, 4, 10);
-        UnionRgn(l.get(), leg.get(), l.get());
-        InsetRgn(l.get(), 1, 1);
-        QRegion expected = QRegion(1, 1, 8, 2).united(QRegion(1, 1, 2, 8));
-        QCOMPARE(*l, expected);
     }
 
     void mapRgn()
@@ -295,9 +211,6 @@ private Q_SLOTS:
         // Mapping back restores the region.
         MapRgn(r.get(), &dst, &src);
         Rgn original = rectRgn(10, 10, 20, 20);
-        QVERIFY(EqualRgn(r.get(), original.get()));
-        // Identity map.
-        MapRgn(r.get(), &src, &src);
         QVERIFY(EqualRgn(r.get(), original.get()));
         // An empty source is refused with a log line and leaves the region alone.
         VelmarTest::LogCapture log;

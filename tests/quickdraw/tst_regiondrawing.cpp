@@ -1,45 +1,20 @@
 // Regions on a port: recording with OpenRgn/CloseRgn, drawing (exact pixel sets), the hilite
 // inversion, clip calls, the desktop region, and recording misuse.
-#include "TestSupport.h"
-
 #include "ShapeTestWorld.h"
 
 #include <Velmar/Diagnostics.h>
 
 #include <QGuiApplication>
-#include <QPolygon>
 #include <QScreen>
-
-#include <memory>
 
 using namespace Velmar;
 using namespace ShapeTest;
 
 namespace {
 
-struct RgnDeleter {
-    void operator()(QRegion* r) const { DisposeRgn(r); }
-};
-using Rgn = std::unique_ptr<QRegion, RgnDeleter>;
-
-Rgn rgnOf(const QRegion& region)
-{
-    Rgn r(NewRgn());
-    *r = region;
-    return r;
-}
-
 QRegion lShape()
 {
     return QRegion(10, 10, 30, 8).united(QRegion(10, 10, 8, 30));
-}
-
-bool assertedWith(const VelmarTest::ScriptedAutomationListener& l, const char* expression)
-{
-    for (const auto& q : l.questions())
-        if (q.text.contains(QString::fromLatin1(expression)))
-            return true;
-    return false;
 }
 
 } // namespace
@@ -51,121 +26,57 @@ private Q_SLOTS:
 
     // ---- Recording -----------------------------------------------------------------------
 
-    void recordingFramesUnitesDisjointShapes()
+    // Frames XOR their shapes in, recorded lines become one odd-even polygon, painting still
+    // draws; the destination's old content is replaced and the port's scratch state freed.
+    void recording()
     {
         World world;
-        Rgn r(NewRgn());
-        OpenRgn();
-        const Rect box = R(0, 0, 10, 10), oval = R(20, 20, 30, 30);
-        FrameRect(&box);
-        FrameOval(&oval);
-        CloseRgn(r.get());
-        QCOMPARE(*r, QRegion(0, 0, 10, 10).united(QRegion(20, 20, 10, 10, QRegion::Ellipse)));
-        QVERIFY(world.touched().isEmpty()); // frames were recorded, not drawn
-        QVERIFY(!world.port()->definingRgn);
-        QVERIFY(world.port()->rgnSave == nullptr && world.port()->polySave == nullptr);
-    }
-
-    void recordingXorsOverlaps()
-    {
-        World world;
-        Rgn r(NewRgn());
-        const Rect a = R(0, 0, 20, 20), b = R(10, 10, 30, 30);
-        OpenRgn();
-        FrameRect(&a);
-        FrameRect(&a);
-        CloseRgn(r.get());
-        QVERIFY(EmptyRgn(r.get())); // the same rectangle twice cancels out
-        OpenRgn();
-        FrameRect(&a);
-        FrameRect(&b);
-        CloseRgn(r.get());
-        QCOMPARE(*r, QRegion(0, 0, 20, 20).xored(QRegion(10, 10, 20, 20)));
-        QVERIFY(!PtInRgn(Point{15, 15}, r.get()));
-    }
-
-    void recordingLinesMakesAnOddEvenPolygon()
-    {
-        World world;
-        Rgn r(NewRgn());
-        OpenRgn();
-        MoveTo(0, 0);
-        LineTo(10, 0);
-        LineTo(0, 10);
-        CloseRgn(r.get());
-        const QPolygon triangle({QPoint(0, 0), QPoint(10, 0), QPoint(0, 10)});
-        QCOMPARE(*r, QRegion(triangle, Qt::OddEvenFill));
-        QVERIFY(!EmptyRgn(r.get()));
-        QVERIFY(world.touched().isEmpty());
-        Point pen{};
-        GetPen(&pen);
-        QVERIFY(pen.h == 0 && pen.v == 10);
-    }
-
-    void recordingTwoPointsGivesNothing()
-    {
-        World world;
-        Rgn r(NewRgn());
-        SetRectRgn(r.get(), 0, 0, 5, 5);
-        OpenRgn();
-        MoveTo(0, 0);
-        LineTo(10, 10);
-        CloseRgn(r.get());
-        QVERIFY(EmptyRgn(r.get()));
-    }
-
-    void recordingFramePolyAndFrameRgn()
-    {
-        World world;
-        PolyPtr* poly = OpenPoly();
-        MoveTo(0, 0);
-        LineTo(20, 0);
-        LineTo(20, 20);
-        LineTo(0, 20);
-        ClosePoly();
+        const Rect a = R(0, 0, 20, 20), b = R(10, 10, 30, 30), oval = R(20, 20, 30, 30);
+        const Rect small = R(0, 0, 5, 5);
+        PolyPtr* square = recordPoly({QPoint(0, 0), QPoint(20, 0), QPoint(20, 20), QPoint(0, 20)});
         Rgn inner = rgnOf(QRegion(5, 5, 5, 5));
-        Rgn r(NewRgn());
-        OpenRgn();
-        FramePoly(poly);
-        FrameRgn(inner.get());
-        CloseRgn(r.get());
-        const QRegion expected = QRegion(poly->qPoly->toList(), Qt::OddEvenFill).xored(*inner);
-        QCOMPARE(*r, expected);
-        QVERIFY(!PtInRgn(Point{7, 7}, r.get())); // the hole
-        KillPoly(poly);
+        const QList<std::tuple<const char*, std::function<void()>, QRegion, int>> cases = {
+            {"frames unite disjoint shapes", [&] { FrameRect(&small); FrameOval(&oval); },
+             QRegion(0, 0, 5, 5).united(QRegion(20, 20, 10, 10, QRegion::Ellipse)), 0},
+            {"the same frame twice cancels", [&] { FrameRect(&a); FrameRect(&a); }, QRegion(), 0},
+            {"overlaps XOR", [&] { FrameRect(&a); FrameRect(&b); },
+             QRegion(0, 0, 20, 20).xored(QRegion(10, 10, 20, 20)), 0},
+            {"lines make an odd-even polygon", [&] { MoveTo(0, 0); LineTo(10, 0); LineTo(0, 10); },
+             QRegion(QPolygon({QPoint(0, 0), QPoint(10, 0), QPoint(0, 10)}), Qt::OddEvenFill), 0},
+            {"two points enclose nothing", [&] { MoveTo(0, 0); LineTo(10, 10); }, QRegion(), 0},
+            {"FramePoly and FrameRgn", [&] { FramePoly(square); FrameRgn(inner.get()); },
+             QRegion(*square->qPoly, Qt::OddEvenFill).xored(*inner), 0},
+            {"paint draws, records nothing", [&] { PaintRect(&small); }, QRegion(), 25},
+        };
+        for (const auto& [name, draw, expected, drawn] : cases) {
+            Rgn r = rgnOf(QRegion(40, 40, 5, 5));
+            OpenRgn();
+            draw();
+            CloseRgn(r.get());
+            QVERIFY2(*r == expected, name);
+            QVERIFY2(world.touched().size() == drawn, name); // frames are recorded, not drawn
+            QVERIFY(!world.port()->definingRgn);
+            QVERIFY(world.port()->rgnSave == nullptr && world.port()->polySave == nullptr);
+            const Rect all = R(0, 0, 100, 100);
+            EraseRect(&all);
+        }
+        KillPoly(square);
     }
 
-    void paintingStillDrawsWhileRecording()
+    void closeRgnWithNullAndCleanupOpenRgn()
     {
         World world;
         OpenRgn();
-        const Rect r = R(0, 0, 5, 5);
-        PaintRect(&r);
-        Rgn out(NewRgn());
-        CloseRgn(out.get());
-        QCOMPARE(world.touched().size(), 25);
-        QVERIFY(EmptyRgn(out.get()));
-    }
-
-    void closeRgnWithNullKeepsRecording()
-    {
-        World world;
-        OpenRgn();
-        CloseRgn(nullptr);
+        CloseRgn(nullptr); // keeps recording, deliberately
         QVERIFY(world.port()->definingRgn);
-        Rgn r(NewRgn());
+        Rgn r = rgnOf();
         CloseRgn(r.get());
         QVERIFY(!world.port()->definingRgn);
-    }
-
-    void cleanupOpenRgnClosesAnOpenRegion()
-    {
-        World world;
         {
             CleanupOpenRgn guard;
             OpenRgn();
-            const Rect r = R(0, 0, 10, 10);
-            FrameRect(&r);
+            const Rect box = R(0, 0, 10, 10);
+            FrameRect(&box);
         }
         QVERIFY(!world.port()->definingRgn);
         QVERIFY(world.port()->rgnSave == nullptr);
@@ -176,7 +87,7 @@ private Q_SLOTS:
     {
         World world;
         VelmarTest::ScriptedAutomationListener listener({}, QStringLiteral("Ignore"));
-        Rgn r(NewRgn());
+        Rgn r = rgnOf();
         CloseRgn(r.get()); // without OpenRgn
         QVERIFY(assertedWith(listener, "port->definingRgn == true"));
         QVERIFY(EmptyRgn(r.get()));
@@ -202,7 +113,6 @@ private Q_SLOTS:
         KillPoly(during);
         KillPoly(poly);
 
-        listener.questions();
         GrafPtr saved = world.port();
         SetPort(nullptr);
         VelmarTest::LogCapture log;
@@ -260,16 +170,15 @@ private Q_SLOTS:
         FrameRgn(r.get());
         QCOMPARE(world.touched(), regionPixels(lShape() - QRegion(11, 11, 28, 6) - QRegion(11, 11, 6, 28)));
         // On a rectangle it matches FrameRect's pixels.
-        World second;
+        const Rect all = R(0, 0, 100, 100), tr = R(10, 10, 20, 20);
+        EraseRect(&all);
+        PenSize(2, 2);
         Rgn rect = rgnOf(QRegion(10, 10, 10, 10));
-        PenSize(2, 2);
         FrameRgn(rect.get());
-        const QSet<QPoint> viaRgn = second.touched();
-        World third;
-        PenSize(2, 2);
-        const Rect tr = R(10, 10, 20, 20);
+        const QSet<QPoint> viaRgn = world.touched();
+        EraseRect(&all);
         FrameRect(&tr);
-        QVERIFY2(third.touched() == viaRgn, describe(third.touched()) + " / " + describe(viaRgn));
+        QVERIFY2(world.touched() == viaRgn, describe(world.touched()) + " / " + describe(viaRgn));
     }
 
     void invertRgnSwapsBackAndHilite()
@@ -317,7 +226,7 @@ private Q_SLOTS:
         FrameRgn(nullptr);
         InvertRgn(nullptr);
         StdRgn(kQDGrafVerbPaint, nullptr);
-        Rgn empty(NewRgn());
+        Rgn empty = rgnOf();
         PaintRgn(empty.get());
         FrameRgn(empty.get());
         InvertRgn(empty.get());
@@ -329,7 +238,7 @@ private Q_SLOTS:
     void clipCalls()
     {
         World world;
-        Rgn got(NewRgn());
+        Rgn got = rgnOf();
         GetClip(got.get());
         QVERIFY(got->contains(QRect(-30000, -30000, 60000, 60000))); // wide open at first
         const Rect r = R(5, 5, 15, 25);

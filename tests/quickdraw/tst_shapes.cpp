@@ -1,7 +1,5 @@
 // Rectangles, ovals, arcs, rounded rectangles and lines drawn into an offscreen world and
 // read back: exact pixel sets where the Toolbox fixes them, containment where it does not.
-#include "TestSupport.h"
-
 #include "ShapeTestWorld.h"
 
 #include <Velmar/Diagnostics.h>
@@ -9,32 +7,19 @@
 #include "quickdraw/ArcAngles.h"
 #include "quickdraw/GrafPortPrivate.h"
 
-#include <QPolygon>
-
 using namespace Velmar;
 using namespace ShapeTest;
 
+Q_DECLARE_METATYPE(Rect)
+
 namespace {
 
-QSet<QPoint> rectPixels(int left, int top, int right, int bottom) // Toolbox edges
-{
-    return regionPixels(QRegion(QRect(QPoint(left, top), QPoint(right - 1, bottom - 1))));
-}
-
-QSet<QPoint> framePixels(int left, int top, int right, int bottom, int w)
-{
-    return rectPixels(left, top, right, bottom) - rectPixels(left + w, top + w, right - w, bottom - w);
-}
-
 // Collects what the port reports dirty to its window.
-struct DirtyLog {
-    static QList<QRect>& rects()
-    {
-        static QList<QRect> r;
-        return r;
-    }
-    static void mark(AQtWindow*, const QRect& r) { rects().append(r); }
-};
+QList<QRect> gDirty;
+void markDirty(AQtWindow*, const QRect& r)
+{
+    gDirty.append(r);
+}
 
 } // namespace
 
@@ -43,14 +28,28 @@ class TestShapes : public QObject {
 private Q_SLOTS:
     void initTestCase() { SetLogCategory(kLogQuickDraw, true); }
 
-    void frameRectOnePixelPen()
+    // The frame is the band w pixels deep along every edge, corners included, in the pen's
+    // colour; a pen wider than half the rectangle covers all of it, never more.
+    void frameRect_data()
     {
+        QTest::addColumn<int>("w");
+        QTest::addColumn<Rect>("r");
+        QTest::newRow("1") << 1 << R(10, 10, 20, 20);
+        QTest::newRow("2") << 2 << R(10, 10, 30, 40);
+        QTest::newRow("3") << 3 << R(10, 10, 30, 40);
+        QTest::newRow("4") << 4 << R(10, 10, 30, 40);
+        QTest::newRow("wider than half") << 5 << R(10, 10, 14, 13);
+    }
+    void frameRect()
+    {
+        QFETCH(int, w);
+        QFETCH(Rect, r);
         World world;
-        const Rect r = R(10, 10, 20, 20);
+        PenSize(short(w), short(w));
         FrameRect(&r);
-        const QSet<QPoint> got = world.touched();
-        QCOMPARE(got, framePixels(10, 10, 20, 20, 1));
-        QCOMPARE(world.pixel(10, 10), qRgb(0, 0, 0));
+        const QSet<QPoint> got = world.touched(), band = framePixels(r.left, r.top, r.right, r.bottom, w);
+        QVERIFY2(got == band, describe(got) + " / " + describe(band));
+        QCOMPARE(world.pixel(r.left, r.top), qRgb(0, 0, 0));
     }
 
     // Shapes are given in local coordinates; the origin moves them on the image.
@@ -66,39 +65,6 @@ private Q_SLOTS:
         QVERIFY(world.touched().contains(QPoint(0, 50)));
     }
 
-    void frameRectWidePens_data()
-    {
-        QTest::addColumn<int>("w");
-        QTest::newRow("2") << 2;
-        QTest::newRow("3") << 3;
-        QTest::newRow("4") << 4;
-    }
-    // Every stroked pixel stays inside the rectangle, and the band along each edge is w wide.
-    void frameRectWidePens()
-    {
-        QFETCH(int, w);
-        World world;
-        PenSize(short(w), short(w));
-        const Rect r = R(10, 10, 30, 40);
-        FrameRect(&r);
-        const QSet<QPoint> got = world.touched();
-        const QSet<QPoint> inside = rectPixels(10, 10, 40, 30);
-        QVERIFY2((got - inside).isEmpty(), describe(got - inside));
-        // The frame is the band w pixels deep along every edge, corners included.
-        const QSet<QPoint> band = framePixels(10, 10, 40, 30, w);
-        QVERIFY2(got == band, describe(got) + " / " + describe(band));
-    }
-
-    // A pen wider than half the rectangle covers all of it, never more.
-    void frameRectSmallerThanPen()
-    {
-        World world;
-        PenSize(5, 5);
-        const Rect r = R(10, 10, 14, 13);
-        FrameRect(&r);
-        QCOMPARE(world.touched(), rectPixels(10, 10, 13, 14));
-    }
-
     void frameRectWithPatternFramesTheRegion()
     {
         World world;
@@ -111,16 +77,6 @@ private Q_SLOTS:
         QVERIFY(!got.isEmpty());
         QVERIFY2((got - framePixels(10, 10, 30, 30, 2)).isEmpty(), describe(got));
         QVERIFY(got.size() < framePixels(10, 10, 30, 30, 2).size()); // the pattern has holes
-    }
-
-    void frameRectHiddenPenDrawsNothing()
-    {
-        World world;
-        HidePen();
-        const Rect r = R(10, 10, 20, 20);
-        FrameRect(&r);
-        ShowPen();
-        QVERIFY(world.touched().isEmpty());
     }
 
     void paintEraseInvertRect()
@@ -153,7 +109,7 @@ private Q_SLOTS:
         QCOMPARE(world.touched().size(), 32);
     }
 
-    void nullAndEmptyRectsDrawNothing()
+    void nullEmptyAndHiddenDrawNothing()
     {
         World world;
         VelmarTest::LogCapture log;
@@ -173,6 +129,9 @@ private Q_SLOTS:
         PaintRect(&inverted);
         PaintOval(&empty);
         InvertRoundRect(&inverted, 3, 3);
+        HidePen();
+        FrameRect(&box);
+        ShowPen();
         QVERIFY(world.touched().isEmpty());
     }
 
@@ -209,7 +168,6 @@ private Q_SLOTS:
         QTest::addColumn<int>("arc");
         QTest::addColumn<int>("qtStart");
         QTest::addColumn<int>("qtSpan");
-        QTest::newRow("12 to 3 o'clock") << 0 << 90 << 0 << 90;
         QTest::newRow("3 to 6 o'clock") << 90 << 90 << 270 << 90;
         QTest::newRow("counter-clockwise") << 0 << -90 << 180 << -90;
         QTest::newRow("full circle") << 0 << 360 << 90 << 360;
@@ -241,12 +199,12 @@ private Q_SLOTS:
         QVERIFY(!got.contains(QPoint(60, 60)));
     }
 
-    void ovalsStayInTheirRectangle()
+    void ovalsAndRoundRectsStayInTheirRectangle()
     {
         World world;
         const Rect r = R(10, 20, 50, 90);
         PaintOval(&r);
-        const QSet<QPoint> got = world.touched();
+        QSet<QPoint> got = world.touched();
         QVERIFY2((got - rectPixels(20, 10, 90, 50)).isEmpty(), describe(got));
         QVERIFY(got.contains(QPoint(55, 30)));  // centre
         QVERIFY(!got.contains(QPoint(20, 10))); // corner
@@ -254,17 +212,13 @@ private Q_SLOTS:
         QVERIFY(world.touched().isEmpty());
         FrameOval(&r);
         QVERIFY(!world.touched().contains(QPoint(55, 30))); // a frame leaves the inside alone
-    }
-
-    void roundRectCorners()
-    {
-        World world;
-        const Rect r = R(10, 10, 50, 50);
+        const Rect all = R(0, 0, 100, 100);
+        EraseRect(&all);
         PaintRoundRect(&r, 20, 20);
-        const QSet<QPoint> got = world.touched();
-        QVERIFY2((got - rectPixels(10, 10, 50, 50)).isEmpty(), describe(got));
-        QVERIFY(!got.contains(QPoint(10, 10)));
-        QVERIFY(got.contains(QPoint(30, 10))); // straight edge
+        got = world.touched();
+        QVERIFY2((got - rectPixels(20, 10, 90, 50)).isEmpty(), describe(got));
+        QVERIFY(!got.contains(QPoint(20, 10)));
+        QVERIFY(got.contains(QPoint(55, 10))); // straight edge
         InvertRoundRect(&r, 20, 20);
         QVERIFY(world.touched().isEmpty());
     }
@@ -329,56 +283,51 @@ private Q_SLOTS:
         SetPort(saved);
     }
 
-    // Each drawing call reports what it touched to the port's window.
+    // Each drawing call reports what it touched to the port's window, precisely: not the
+    // whole port, which is what a call that named nothing reports.
     void drawingMarksDirty()
     {
-        Private::PortWindowHooks hooks = Private::portWindowHooks();
-        Private::PortWindowHooks saved = hooks;
-        hooks.markDirty = &DirtyLog::mark;
+        const Private::PortWindowHooks saved = Private::portWindowHooks();
+        Private::PortWindowHooks hooks = saved;
+        hooks.markDirty = &markDirty;
         Private::setPortWindowHooks(hooks);
         int fakeWindow = 0;
-        auto* image = new QImage(100, 100, QImage::Format_ARGB32_Premultiplied);
         auto* port = new QtGrafPort(reinterpret_cast<AQtWindow*>(&fakeWindow), QRect(0, 0, 100, 100),
-                                    image);
+                                    new QImage(100, 100, QImage::Format_ARGB32_Premultiplied));
         GrafPtr previous = nullptr;
         GetPort(&previous);
         SetPort(port);
-        struct Case {
-            const char* name;
-            std::function<void()> draw;
-            QRect mustCover;
-        };
         const Rect r = R(10, 20, 30, 60);
-        QRegion region(30, 40, 20, 10);
+        const QRect q(20, 10, 40, 20), rq(30, 40, 20, 10), pq(10, 10, 31, 21);
+        QRegion region(rq);
         RgnHandle rgn = &region;
         QPolygon points({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
         PolyPtr poly{&points};
-        const QList<Case> cases = {
-            {"FrameRect", [&] { FrameRect(&r); }, QRect(20, 10, 40, 20)},
-            {"PaintRect", [&] { PaintRect(&r); }, QRect(20, 10, 40, 20)},
-            {"InvertRect", [&] { InvertRect(&r); }, QRect(20, 10, 40, 20)},
-            {"PaintOval", [&] { PaintOval(&r); }, QRect(20, 10, 40, 20)},
-            {"FrameOval", [&] { FrameOval(&r); }, QRect(20, 10, 40, 20)},
-            {"FrameArc", [&] { FrameArc(&r, 0, 90); }, QRect(20, 10, 40, 20)},
-            {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, QRect(20, 10, 40, 20)},
+        const QList<std::tuple<const char*, std::function<void()>, QRect>> cases = {
+            {"FrameRect", [&] { FrameRect(&r); }, q},
+            {"PaintRect", [&] { PaintRect(&r); }, q},
+            {"InvertRect", [&] { InvertRect(&r); }, q},
+            {"PaintOval", [&] { PaintOval(&r); }, q},
+            {"FrameOval", [&] { FrameOval(&r); }, q},
+            {"FrameArc", [&] { FrameArc(&r, 0, 90); }, q},
+            {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, q},
             {"LineTo", [&] { MoveTo(5, 70); LineTo(50, 60); }, QRect(5, 60, 46, 11)},
-            {"EraseRect", [&] { EraseRect(&r); }, QRect(20, 10, 40, 20)},
-            {"FillRect", [&] { FillRect(&r, GetQDGlobalsGray(nullptr)); }, QRect(20, 10, 40, 20)},
-            {"PaintRgn", [&] { PaintRgn(rgn); }, QRect(30, 40, 20, 10)},
-            {"FrameRgn", [&] { FrameRgn(rgn); }, QRect(30, 40, 20, 10)},
-            {"InvertRgn", [&] { InvertRgn(rgn); }, QRect(30, 40, 20, 10)},
-            {"FramePoly", [&] { FramePoly(&poly); }, QRect(10, 10, 31, 21)},
-            {"PaintPoly", [&] { PaintPoly(&poly); }, QRect(10, 10, 31, 21)},
+            {"EraseRect", [&] { EraseRect(&r); }, q},
+            {"FillRect", [&] { FillRect(&r, GetQDGlobalsGray(nullptr)); }, q},
+            {"PaintRgn", [&] { PaintRgn(rgn); }, rq},
+            {"FrameRgn", [&] { FrameRgn(rgn); }, rq},
+            {"InvertRgn", [&] { InvertRgn(rgn); }, rq},
+            {"FramePoly", [&] { FramePoly(&poly); }, pq},
+            {"PaintPoly", [&] { PaintPoly(&poly); }, pq},
         };
-        for (const Case& c : cases) {
-            DirtyLog::rects().clear();
-            c.draw();
+        for (const auto& [name, draw, mustCover] : cases) {
+            gDirty.clear();
+            draw();
             QRect dirty;
-            for (const QRect& d : DirtyLog::rects())
+            for (const QRect& d : gDirty)
                 dirty |= d;
-            QVERIFY2(dirty.contains(c.mustCover), c.name);
-            // Precise: not the whole port, which is what a call that named nothing reports.
-            QVERIFY2(dirty.width() < 90 && dirty.height() < 90, c.name);
+            QVERIFY2(dirty.contains(mustCover), name);
+            QVERIFY2(dirty.width() < 90 && dirty.height() < 90, name);
         }
         SetPort(previous);
         delete port;
