@@ -112,8 +112,6 @@ private Q_SLOTS:
         QCOMPARE(world->currentCompositionMode(), QPainter::RasterOp_NotSourceXorDestination);
         PenNormal();
         PenState saved;
-        QCOMPARE(saved.penMode(), SInt16(0));
-        QCOMPARE(saved.penSize(), 0);
         SetPenState(&state);
         GetPenState(&saved);
         QCOMPARE(saved.penLocation(), QPoint(3, 4));
