@@ -25,7 +25,46 @@ Point globalMousePosition()
     return Point{SInt16(p.y()), SInt16(p.x())};
 }
 
+// The mouse position and modifiers every posted event carries. Asking for them costs a
+// round trip to the X server each (pointer position, caps lock), far more than the rest of
+// a post, so they are read at most once per tick: events stamped in the same 1/60 s share
+// their time stamp already, and now their position and modifiers too. Qt's own modifier
+// and button state is part of the key (it is plain memory, updated as input is delivered),
+// so a modifier or button change the application has seen is picked up at once; a pointer
+// move or caps lock toggle within the tick is not, until ForgetInputSnapshot() is called.
+struct InputSnapshot {
+    bool valid = false;
+    UInt32 tick = 0;
+    Qt::KeyboardModifiers qtModifiers;
+    Qt::MouseButtons qtButtons;
+    Point where{0, 0};
+    UInt32 modifiers = 0;
+};
+
+InputSnapshot gSnapshot;
+
+const InputSnapshot& currentInput(UInt32 tick)
+{
+    const Qt::KeyboardModifiers qtModifiers = QGuiApplication::keyboardModifiers();
+    const Qt::MouseButtons qtButtons = QGuiApplication::mouseButtons();
+    if (!gSnapshot.valid || gSnapshot.tick != tick || gSnapshot.qtModifiers != qtModifiers
+        || gSnapshot.qtButtons != qtButtons) {
+        gSnapshot.where = globalMousePosition();
+        gSnapshot.modifiers = GetCurrentKeyModifiers();
+        gSnapshot.tick = tick;
+        gSnapshot.qtModifiers = qtModifiers;
+        gSnapshot.qtButtons = qtButtons;
+        gSnapshot.valid = true;
+    }
+    return gSnapshot;
+}
+
 } // namespace
+
+void ForgetInputSnapshot()
+{
+    gSnapshot.valid = false;
+}
 
 void FillNullEvent(EventQueueItem* item)
 {
@@ -33,8 +72,9 @@ void FillNullEvent(EventQueueItem* item)
         return;
     item->clear();
     item->when = TickCount();
-    item->where = globalMousePosition();
-    item->modifiers = GetCurrentKeyModifiers();
+    const InputSnapshot& input = currentInput(item->when);
+    item->where = input.where;
+    item->modifiers = input.modifiers;
 }
 
 } // namespace Private
