@@ -1,7 +1,9 @@
-// Shared by the event object and queue tests: one recorder that logs, in order, what each
-// participant saw (assertions, handlers, waiters, queue contents), and stand-ins for the
-// windows and waiters the queue talks to through its hooks.
+// Shared by the event tests: one log that records, in order, what each participant saw
+// (assertions, handlers, waiters, windows, queue contents), and stand-ins for the windows
+// and waiters the queue talks to through its hooks.
 #pragma once
+
+#include "TestSupport.h"
 
 #include "events/EventQueue.h"
 #include "events/EventQueueHooks.h"
@@ -11,6 +13,8 @@
 #include <QHash>
 #include <QSet>
 #include <QStringList>
+
+#include <memory>
 
 namespace EventTest {
 
@@ -22,6 +26,11 @@ using Velmar::Private::EventQueueItemSmartPtr;
 inline AQtWindow* fakeWindow(int n)
 {
     return reinterpret_cast<AQtWindow*>(quintptr(0x1000) * quintptr(n));
+}
+
+inline int windowNumber(AQtWindow* w)
+{
+    return int(quintptr(w) / 0x1000);
 }
 
 inline QString fourChars(UInt32 code)
@@ -42,7 +51,7 @@ inline QString describe(const EventQueueItem* item)
     s += item->eventClass == Velmar::Private::kEventClassVelmar ? fourChars(item->eventKind)
                                                                 : QString::number(item->eventKind);
     if (item->window)
-        s += QStringLiteral("@w%1").arg(quintptr(item->window) / 0x1000);
+        s += QStringLiteral("@w%1").arg(windowNumber(item->window));
     if (item->message)
         s += QStringLiteral(" msg=%1").arg(item->message);
     if (item->skipFlush)
@@ -87,11 +96,13 @@ private:
 
 inline QStringList assertsIn(const QStringList& entries)
 {
-    QStringList out;
-    for (const QString& e : entries)
-        if (e.startsWith(QStringLiteral("assert: ")))
-            out << e;
-    return out;
+    return entries.filter(QStringLiteral("assert: "));
+}
+
+// Answers every assertion with "Ignore" and keeps the questions, for tests that count them.
+inline std::unique_ptr<VelmarTest::ScriptedAutomationListener> ignoreAssertions()
+{
+    return std::make_unique<VelmarTest::ScriptedAutomationListener>(QStringList{}, QStringLiteral("Ignore"));
 }
 
 // Windows as the queue sees them: deletion pending, a non-empty update region, a pending
@@ -105,25 +116,18 @@ public:
         hooks.isUpdateRegionEmpty = [](AQtWindow* w) { return !state().dirty.contains(w); };
         hooks.countPendingUpdateEvents = [] { return UInt32(state().pending.size()); };
         hooks.findPendingUpdateEvent = [](Velmar::Private::PendingUpdatePredicate pred, void* data) {
-            for (AQtWindow* w : state().order) {
+            for (AQtWindow* w : state().order)
                 if (state().pending.contains(w) && pred(state().pending[w].get(), data))
                     return state().pending[w].get();
-            }
             return static_cast<EventQueueItem*>(nullptr);
         };
         hooks.clearPendingUpdateEvents = [](Velmar::Private::PendingUpdatePredicate pred, void* data) {
-            for (AQtWindow* w : state().order) {
-                if (state().pending.contains(w) && pred(state().pending[w].get(), data)) {
-                    log() << QStringLiteral("clear pending w%1").arg(quintptr(w) / 0x1000);
-                    state().pending.remove(w);
-                }
-            }
+            for (AQtWindow* w : state().order)
+                if (state().pending.contains(w) && pred(state().pending[w].get(), data))
+                    clearPending(w);
         };
-        hooks.clearPendingUpdateEvent = [](AQtWindow* w) {
-            log() << QStringLiteral("clear pending w%1").arg(quintptr(w) / 0x1000);
-            state().pending.remove(w);
-        };
-        hooks.windowTitle = [](AQtWindow* w) { return QStringLiteral("Window %1").arg(quintptr(w) / 0x1000); };
+        hooks.clearPendingUpdateEvent = clearPending;
+        hooks.windowTitle = [](AQtWindow* w) { return QStringLiteral("Window %1").arg(windowNumber(w)); };
         hooks.legacyEventProcessing = [] { return state().legacy; };
         m_previous = Velmar::Private::SetWindowEventHooks(hooks);
         state() = State();
@@ -156,8 +160,7 @@ public:
 private:
     struct State {
         bool legacy = false;
-        QSet<AQtWindow*> deletePending;
-        QSet<AQtWindow*> dirty;
+        QSet<AQtWindow*> deletePending, dirty;
         QHash<AQtWindow*, EventQueueItemSmartPtr> pending;
         QList<AQtWindow*> order;
     };
@@ -165,6 +168,11 @@ private:
     {
         static State sState;
         return sState;
+    }
+    static void clearPending(AQtWindow* w)
+    {
+        log() << QStringLiteral("clear pending w%1").arg(windowNumber(w));
+        state().pending.remove(w);
     }
     Velmar::Private::WindowEventHooks m_previous;
 };
@@ -194,8 +202,7 @@ private:
 };
 
 // A fresh item of the given class and kind for a window.
-inline EventQueueItemSmartPtr makeItem(UInt32 cls, UInt32 kind, AQtWindow* window = nullptr,
-                                       UInt32 message = 0)
+inline EventQueueItemSmartPtr makeItem(UInt32 cls, UInt32 kind, AQtWindow* window = nullptr, UInt32 message = 0)
 {
     EventQueueItemSmartPtr item = EventQueueItemSmartPtr::Create();
     item->eventClass = cls;

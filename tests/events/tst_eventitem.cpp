@@ -1,52 +1,81 @@
 // Event objects: construction and copying, reference counting misuse, the live-object
-// limit, the parameter table's result codes, predicates, merging and debugging text.
-#include "TestSupport.h"
-#include "tst_eventqueue_support.h"
+// limit, the parameter table's result codes, predicates, debugging text, classic masks and
+// the flattening into classic records.
+#include "events_support.h"
+
+#include "events/EventMask.h"
 
 #include <Velmar/CarbonEvents.h>
+#include <Velmar/Events.h>
 #include <Velmar/MacErrors.h>
 
 #include <cstring>
+#include <type_traits>
 
 using namespace Velmar;
 using namespace EventTest;
 
+// The record keeps the classic widths, then the library's extra fields.
+static_assert(std::is_same_v<decltype(EventRecord::what), UInt16>);
+static_assert(std::is_same_v<decltype(EventRecord::message), UInt32>);
+static_assert(std::is_same_v<decltype(EventRecord::when), UInt32>);
+static_assert(std::is_same_v<decltype(EventRecord::where), Point>);
+static_assert(std::is_same_v<decltype(EventRecord::modifiers), UInt16>);
+static_assert(std::is_same_v<decltype(EventRecord::textUnit), UInt16>);
+static_assert(offsetof(EventRecord, message) < offsetof(EventRecord, when)
+              && offsetof(EventRecord, when) < offsetof(EventRecord, where)
+              && offsetof(EventRecord, where) < offsetof(EventRecord, modifiers)
+              && offsetof(EventRecord, modifiers) < offsetof(EventRecord, window)
+              && offsetof(EventRecord, window) < offsetof(EventRecord, textUnit)
+              && offsetof(EventRecord, textUnit) < offsetof(EventRecord, qtKey)
+              && offsetof(EventRecord, qtKey) < offsetof(EventRecord, qtModifiers));
+
 namespace {
+
+QString pairsText(const Private::EventTypeList& list)
+{
+    QStringList parts;
+    for (UInt32 i = 0; i < list.count; ++i)
+        parts << fourChars(list.specs[i].eventClass) + u'/' + QString::number(list.specs[i].eventKind);
+    return parts.join(u' ');
+}
+
+// "what=3 msg=4660 mods=512 unit=97 key=65 qmods=33554432" (time, place and window are
+// checked separately: every row copies them).
+QString recordText(const EventRecord& r)
+{
+    return QStringLiteral("what=%1 msg=%2 mods=%3 unit=%4 key=%5 qmods=%6")
+        .arg(r.what).arg(r.message, 0, 16).arg(r.modifiers).arg(r.textUnit).arg(r.qtKey).arg(r.qtModifiers);
+}
 
 // What a test sets on the item before asking for one parameter.
 enum class Setup { Plain, Modifiers, Wheel, WheelZero, MouseDownWheel, KeyDownWheelZero, Window };
 
+struct SetupRow {
+    UInt32 cls, kind, modifiers;
+    UInt16 wheelAxis;
+    SInt32 wheelDelta;
+    int window;
+};
+
+// Indexed by Setup.
+const SetupRow kSetups[] = {
+    {kEventClassKeyboard, kEventRawKeyDown, 0, 0, 0, 0},
+    {kEventClassKeyboard, kEventRawKeyDown, shiftKey, 0, 0, 0},
+    {kEventClassMouse, kEventMouseWheelMoved, 0, kEventMouseWheelAxisY, -2, 0},
+    {kEventClassMouse, kEventMouseWheelMoved, 0, 0, 0, 0},
+    {kEventClassMouse, kEventMouseDown, 0, 0, 0, 0},
+    {kEventClassKeyboard, kEventMouseDown, 0, 0, 0, 0},
+    {kEventClassWindow, kEventWindowActivated, 0, 0, 0, 3},
+};
+
 EventQueueItemSmartPtr itemFor(Setup setup)
 {
-    EventQueueItemSmartPtr item = EventQueueItemSmartPtr::Create();
-    switch (setup) {
-    case Setup::Plain:
-        item->eventClass = kEventClassKeyboard;
-        item->eventKind = kEventRawKeyDown;
-        break;
-    case Setup::Modifiers:
-        item->eventClass = kEventClassKeyboard;
-        item->eventKind = kEventRawKeyDown;
-        item->modifiers = shiftKey;
-        break;
-    case Setup::Wheel:
-    case Setup::WheelZero:
-    case Setup::MouseDownWheel:
-    case Setup::KeyDownWheelZero:
-        item->eventClass = setup == Setup::KeyDownWheelZero ? kEventClassKeyboard : kEventClassMouse;
-        item->eventKind = setup == Setup::Wheel || setup == Setup::WheelZero ? kEventMouseWheelMoved
-                                                                              : kEventMouseDown;
-        item->wheelAxis = setup == Setup::Wheel ? kEventMouseWheelAxisY : 0;
-        item->wheelDelta = setup == Setup::Wheel ? -2 : 0;
-        if (setup == Setup::MouseDownWheel)
-            item->wheelDelta = 0;
-        break;
-    case Setup::Window:
-        item->eventClass = kEventClassWindow;
-        item->eventKind = kEventWindowActivated;
-        item->window = fakeWindow(3);
-        break;
-    }
+    const SetupRow& row = kSetups[int(setup)];
+    EventQueueItemSmartPtr item = makeItem(row.cls, row.kind, row.window ? fakeWindow(row.window) : nullptr);
+    item->modifiers = row.modifiers;
+    item->wheelAxis = row.wheelAxis;
+    item->wheelDelta = row.wheelDelta;
     return item;
 }
 
@@ -349,37 +378,6 @@ private Q_SLOTS:
         QVERIFY(!item->IsSynchronized());
     }
 
-    void guessMergePolicy()
-    {
-        using P = EventQueueItem;
-        QCOMPARE(makeItem(kEventClassWindow, kEventWindowUpdate)->GuessMergePolicy(), P::ReplaceQueued);
-        QCOMPARE(makeItem(kEventClassWindow, kEventWindowActivated)->GuessMergePolicy(), P::ReplaceQueued);
-        QCOMPARE(makeItem(kEventClassWindow, kEventWindowDeactivated)->GuessMergePolicy(), P::ReplaceQueued);
-        QCOMPARE(makeItem(kEventClassWindow, kEventWindowShown)->GuessMergePolicy(), P::NoMerge);
-        QCOMPARE(makeItem(kEventClassMouse, kEventMouseDown)->GuessMergePolicy(), P::NoMerge);
-    }
-
-    void mergeTakesOnlyTheSkipMark()
-    {
-        AssertRecorder asserts;
-        EventQueueItemSmartPtr a = makeItem(kEventClassWindow, kEventWindowUpdate, fakeWindow(1), 1);
-        EventQueueItemSmartPtr b = makeItem(kEventClassWindow, kEventWindowUpdate, fakeWindow(2), 2);
-        b->skipFlush = 1;
-        a->Merge(b.get());
-        log() << describe(a.get());
-        b->skipFlush = 0;
-        a->Merge(b.get()); // an unset mark does not clear a set one
-        log() << describe(a.get());
-        EventQueueItemSmartPtr other = makeItem(kEventClassMouse, kEventMouseUp);
-        other->skipFlush = 1;
-        b->Merge(other.get()); // mismatch: asserted, merged all the same
-        log() << describe(b.get());
-        b->Merge(nullptr);
-        QCOMPARE(log(), (QStringList{"wind/1@w1 msg=1 skip", "wind/1@w1 msg=1 skip",
-                                     "assert: eventClass == other->eventClass",
-                                     "assert: eventKind == other->eventKind", "wind/1@w2 msg=2 skip"}));
-    }
-
     void debuggingStrings()
     {
         QCOMPARE(EventQueueItem::EventClassAndKindToString(kEventClassMouse, kEventMouseDown),
@@ -412,6 +410,149 @@ private Q_SLOTS:
             QCOMPARE(raw->refCount, SInt16(3));
         }
         QCOMPARE(raw->refCount, SInt16(1));
+    }
+
+    void parse_data()
+    {
+        QTest::addColumn<int>("mask");
+        QTest::addColumn<int>("result");
+        QTest::addColumn<QString>("pairs");
+
+        QTest::newRow("everyEvent") << int(everyEvent) << 0 << "";
+        QTest::newRow("zero") << 0 << 0 << "";
+        QTest::newRow("activate: two kinds") << int(activMask) << 2 << "wind/5 wind/6";
+        QTest::newRow("os: two kinds") << int(osMask) << 2 << "appl/1 appl/2";
+        QTest::newRow("table order") << int(osMask | keyUpMask | mDownMask) << 4 << "mous/1 keyb/3 appl/1 appl/2";
+        QTest::newRow("unknown bits ignored beside a known one") << int(0x0001 | 0x0080 | mUpMask) << 1 << "mous/2";
+        // one pair per bit, in bit order: each bit's own mapping shows in its place
+        QTest::newRow("all known bits") << int(0x817E) << 10
+                                        << "mous/1 mous/2 keyb/1 keyb/3 keyb/2 wind/1 wind/5 wind/6 appl/1 appl/2";
+        QTest::newRow("everyEvent less one bit") << int(0xFFFE) << 10
+                                                 << "mous/1 mous/2 keyb/1 keyb/3 keyb/2 wind/1 wind/5 wind/6 appl/1 appl/2";
+        QTest::newRow("null-event bit only") << 1 << -1 << "";
+        QTest::newRow("disk and high-level only") << int(diskMask | highLevelEventMask) << -1 << "";
+    }
+
+    void parse()
+    {
+        QFETCH(int, mask);
+        QFETCH(int, result);
+        QFETCH(QString, pairs);
+        VelmarTest::LogCapture capture;
+        Private::EventTypeList list;
+        QCOMPARE(Private::ParseEventMask(UInt16(mask), list), result);
+        QCOMPARE(pairsText(list), pairs);
+        QCOMPARE(capture.count(QStringLiteral("Unable to parse eventMask at all.... Returning negative")),
+                 result < 0 ? 1 : 0);
+    }
+
+    void matching()
+    {
+        Private::EventTypeList list;
+        Private::ParseEventMask(activMask, list);
+        EventQueueItemSmartPtr activated = makeItem(kEventClassWindow, kEventWindowActivated);
+        EventQueueItemSmartPtr update = makeItem(kEventClassWindow, kEventWindowUpdate);
+        QVERIFY(Private::MatchesEventTypes(list, activated.get()));
+        QVERIFY(!Private::MatchesEventTypes(list, update.get()));
+        QVERIFY(!Private::MatchesEventTypes(list, nullptr));
+        // an empty list matches everything, a null list with a count too
+        Private::EventTypeList empty;
+        QVERIFY(Private::MatchesEventTypes(empty, update.get()));
+        QVERIFY(Private::MatchesEventTypes(nullptr, 3, kEventClassMouse, 1));
+        const EventTypeSpec one[] = {{kEventClassMouse, kEventMouseDown}};
+        QVERIFY(Private::MatchesEventTypes(one, 1, kEventClassMouse, kEventMouseDown));
+        QVERIFY(!Private::MatchesEventTypes(one, 1, kEventClassMouse, kEventMouseUp));
+    }
+
+    void toEventRecord_data()
+    {
+        QTest::addColumn<UInt32>("cls");
+        QTest::addColumn<UInt32>("kind");
+        QTest::addColumn<QString>("record");
+        QTest::addColumn<QString>("assertion");
+        QTest::addColumn<bool>("compatible");
+
+        auto row = [](const char* name, UInt32 cls, UInt32 kind, const char* record, const char* assertion = "") {
+            QTest::newRow(name) << cls << kind << QString::fromLatin1(record) << QString::fromLatin1(assertion)
+                                << !*assertion;
+        };
+        // Every item carries message 0x1234, key message 0xABCD, modifiers shift|cmd,
+        // text unit 97, Qt key 65 and Qt modifiers 0x2000000: the rows show which survive.
+        row("null", 0, 0, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0");
+        row("classic 12", Private::kEventClassVelmarClassic, 12,
+            "what=12 msg=1234 mods=768 unit=97 key=65 qmods=33554432");
+        row("classic 0: a null what that keeps its message", Private::kEventClassVelmarClassic, 0,
+            "what=0 msg=1234 mods=768 unit=97 key=65 qmods=33554432");
+        row("classic low 16 bits", Private::kEventClassVelmarClassic, 0x10017,
+            "what=23 msg=1234 mods=768 unit=97 key=65 qmods=33554432");
+        row("mouse down", kEventClassMouse, kEventMouseDown, "what=1 msg=0 mods=768 unit=0 key=0 qmods=0");
+        row("mouse up", kEventClassMouse, kEventMouseUp, "what=2 msg=0 mods=768 unit=0 key=0 qmods=0");
+        row("key down", kEventClassKeyboard, kEventRawKeyDown,
+            "what=3 msg=abcd mods=768 unit=97 key=65 qmods=33554432");
+        row("key repeat", kEventClassKeyboard, kEventRawKeyRepeat,
+            "what=5 msg=abcd mods=768 unit=97 key=65 qmods=33554432");
+        row("key up", kEventClassKeyboard, kEventRawKeyUp,
+            "what=4 msg=abcd mods=768 unit=97 key=65 qmods=33554432");
+        row("update", kEventClassWindow, kEventWindowUpdate, "what=6 msg=0 mods=0 unit=0 key=0 qmods=0");
+        row("activated", kEventClassWindow, kEventWindowActivated, "what=8 msg=0 mods=1 unit=0 key=0 qmods=0");
+        row("deactivated", kEventClassWindow, kEventWindowDeactivated, "what=8 msg=0 mods=0 unit=0 key=0 qmods=0");
+        row("resume", kEventClassApplication, kEventAppActivated, "what=15 msg=1000001 mods=0 unit=0 key=0 qmods=0");
+        row("suspend", kEventClassApplication, kEventAppDeactivated,
+            "what=15 msg=1000000 mods=0 unit=0 key=0 qmods=0");
+        row("mouse moved", kEventClassMouse, kEventMouseMoved, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "false");
+        row("wheel", kEventClassMouse, kEventMouseWheelMoved, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "false");
+        row("window shown", kEventClassWindow, kEventWindowShown, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0",
+            "false");
+        row("app kind 3", kEventClassApplication, 3, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "false");
+        row("null class, kind 1", 0, 1, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "false");
+        row("library class", Private::kEventClassVelmar, Private::kEventVelmarMenuTriggered,
+            "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "FALSE");
+        row("foreign class", FOUR_CHAR_CODE("cmds"), 1, "what=0 msg=0 mods=0 unit=0 key=0 qmods=0", "FALSE");
+    }
+
+    void toEventRecord()
+    {
+        QFETCH(UInt32, cls);
+        QFETCH(UInt32, kind);
+        QFETCH(QString, record);
+        QFETCH(QString, assertion);
+        QFETCH(bool, compatible);
+
+        AssertRecorder asserts;
+        EventQueueItemSmartPtr item = makeItem(cls, kind, fakeWindow(4), 0x1234);
+        item->keyMessage = 0xABCD;
+        item->modifiers = shiftKey | cmdKey;
+        item->textUnit = 97;
+        item->qtKey = 65;
+        item->qtModifiers = 0x2000000;
+        item->when = 600;
+        item->where = Point{-5, 300};
+
+        const EventRecord r = item->toEventRecord();
+        QCOMPARE(recordText(r), record);
+        QCOMPARE(assertsIn(log()), assertion.isEmpty() ? QStringList() : QStringList{"assert: " + assertion});
+        // time, place and window are copied whatever the row
+        QCOMPARE(r.when, 600u);
+        QCOMPARE(r.where.v, SInt16(-5));
+        QCOMPARE(r.where.h, SInt16(300));
+        QCOMPARE(r.window, fakeWindow(4));
+
+        QCOMPARE(item->isEventRecordCompatible(), compatible);
+        EventRecord converted;
+        std::memset(&converted, 0x77, sizeof converted);
+        QCOMPARE(ConvertEventRefToEventRecord(item.get(), &converted), compatible);
+        if (compatible)
+            QCOMPARE(recordText(converted), record);
+        else
+            QCOMPARE(converted.what, UInt16(0x7777)); // untouched
+    }
+
+    void convertBadInput()
+    {
+        EventQueueItemSmartPtr item = makeItem(kEventClassMouse, kEventMouseDown);
+        EventRecord r{};
+        QVERIFY(!ConvertEventRefToEventRecord(nullptr, &r));
+        QVERIFY(!ConvertEventRefToEventRecord(item.get(), nullptr));
     }
 };
 

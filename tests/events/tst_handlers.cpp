@@ -1,6 +1,7 @@
 // Carbon handler chains: every case records which handler saw which event, in order, and
-// compares the whole sequence.
-#include "TestSupport.h"
+// compares the whole sequence. Then the dispatch blocker: nesting, the queue's disabled
+// flag and what it suppresses.
+#include "events_support.h"
 
 #include "events/EventDispatch.h"
 #include "events/EventQueue.h"
@@ -11,15 +12,15 @@
 #include <Velmar/MacErrors.h>
 
 #include <functional>
-#include <memory>
 
 using namespace Velmar;
 using Private::EventQueueItemSmartPtr;
+using Private::gMainEventQueue;
 
 namespace {
 
-AQtWindow* const kWindowA = reinterpret_cast<AQtWindow*>(0x1000);
-AQtWindow* const kWindowB = reinterpret_cast<AQtWindow*>(0x2000);
+AQtWindow* const kWindowA = EventTest::fakeWindow(1);
+AQtWindow* const kWindowB = EventTest::fakeWindow(2);
 
 QStringList gSeen;
 
@@ -65,26 +66,13 @@ public:
         return h;
     }
 
-    TestHandler& byName(const QString& name)
-    {
-        for (auto& h : m_handlers)
-            if (h->name == name)
-                return *h;
-        qFatal("no handler");
-    }
-
 private:
     std::vector<std::unique_ptr<TestHandler>> m_handlers;
 };
 
-EventQueueItemSmartPtr makeEvent(AQtWindow* window, UInt32 cls = kEventClassMouse,
-                                 UInt32 kind = kEventMouseDown)
+EventQueueItemSmartPtr makeEvent(AQtWindow* window, UInt32 cls = kEventClassMouse, UInt32 kind = kEventMouseDown)
 {
-    EventQueueItemSmartPtr item = EventQueueItemSmartPtr::Create();
-    item->window = window;
-    item->eventClass = cls;
-    item->eventKind = kind;
-    return item;
+    return EventTest::makeItem(cls, kind, window);
 }
 
 EventTargetRef target(const QString& name)
@@ -96,6 +84,11 @@ EventTargetRef target(const QString& name)
     return GetWindowEventTarget(name.startsWith(QStringLiteral("WB")) ? kWindowB : kWindowA);
 }
 
+QString blockerState()
+{
+    return gMainEventQueue.CheckCarbonEventsDisabled() ? QStringLiteral("disabled") : QStringLiteral("enabled");
+}
+
 } // namespace
 
 class tst_Handlers : public QObject {
@@ -105,12 +98,14 @@ private Q_SLOTS:
     void init()
     {
         gSeen.clear();
-        m_listener = std::make_unique<VelmarTest::ScriptedAutomationListener>(QStringList{},
-                                                                              QStringLiteral("Ignore"));
+        m_listener = EventTest::ignoreAssertions();
     }
     void cleanup()
     {
         QCOMPARE(Private::HandlerList::instance().count(), 0);
+        QCOMPARE(blockerState(), QStringLiteral("enabled"));
+        gMainEventQueue.clearAll();
+        QCoreApplication::sendPostedEvents();
         m_listener.reset();
     }
 
@@ -407,6 +402,94 @@ private Q_SLOTS:
         Private::DispatchEventToCallbacks(makeEvent(nullptr, kEventClassMouse, kEventMouseUp));
         QCOMPARE(gSeen, QStringList{"D"});
         RemoveEventHandler(ref);
+    }
+
+    void nestingOnlyOutermostReenables()
+    {
+        QStringList states{blockerState()};
+        {
+            ScopedCarbonEventsBlocker outer("outer");
+            states << blockerState();
+            {
+                ScopedCarbonEventsBlocker inner("inner");
+                states << blockerState();
+                {
+                    ScopedCarbonEventsBlocker innermost(Private::MainEventQueue(), "innermost");
+                    states << blockerState();
+                }
+                states << blockerState();
+            }
+            states << blockerState();
+        }
+        states << blockerState();
+        QCOMPARE(states, (QStringList{"enabled", "disabled", "disabled", "disabled", "disabled",
+                                      "disabled", "enabled"}));
+        QCOMPARE(m_listener->count(), 0);
+    }
+
+    void explicitUnblock()
+    {
+        QStringList states;
+        {
+            ScopedCarbonEventsBlocker outer("outer");
+            {
+                ScopedCarbonEventsBlocker inner("inner");
+                inner.Unblock();
+                QVERIFY(!inner.isBlocked());
+                states << blockerState();
+            } // the destructor of an unblocked blocker restores nothing
+            states << blockerState();
+            outer.Unblock();
+            states << blockerState();
+            QCOMPARE(m_listener->count(), 0);
+            outer.Unblock(); // once too often: reported, no effect
+            QCOMPARE(m_listener->count(), 1);
+            QVERIFY(m_listener->questions()[0].text.contains("m_blocked"));
+            states << blockerState();
+            QCOMPARE(QString::fromLatin1(outer.name()), QStringLiteral("outer"));
+        }
+        states << blockerState();
+        QCOMPARE(states, (QStringList{"disabled", "disabled", "enabled", "enabled", "enabled"}));
+    }
+
+    void nullQueueBlocksNothing()
+    {
+        ScopedCarbonEventsBlocker blocker(nullptr, "none");
+        QVERIFY(!blocker.isBlocked());
+        QCOMPARE(blockerState(), QStringLiteral("enabled"));
+    }
+
+    // Events queued while blocked produce no wake-up; the outermost end raises one.
+    void wakeUpOnlyWhenReenabled()
+    {
+        QStringList marks;
+        {
+            ScopedCarbonEventsBlocker outer("outer");
+            {
+                ScopedCarbonEventsBlocker inner("inner");
+                Private::ScheduleEvent(EventTest::makeItem(kEventClassMouse, kEventMouseDown),
+                                       Private::EventQueueItem::NoMerge);
+                marks << QString::number(gMainEventQueue.hasQueueChangeEvent());
+            }
+            marks << QString::number(gMainEventQueue.hasQueueChangeEvent());
+        }
+        marks << QString::number(gMainEventQueue.hasQueueChangeEvent());
+        QCOMPARE(marks, (QStringList{"0", "0", "1"}));
+        QCOMPARE(gMainEventQueue.count(), UInt32(1));
+    }
+
+    void dispatchWhileBlockedIsReported()
+    {
+        Chain chain;
+        chain.install("D1", GetEventDispatcherTarget(), noErr);
+        {
+            ScopedCarbonEventsBlocker blocker("send");
+            SendEventToEventTarget(
+                EventTest::makeItem(Private::kEventClassVelmar, Private::kEventVelmarResized).get(),
+                GetApplicationEventTarget());
+        }
+        QCOMPARE(m_listener->count(), 1);
+        QVERIFY(m_listener->questions()[0].text.contains("!gMainEventQueue.CheckCarbonEventsDisabled()"));
     }
 
 private:
