@@ -2,6 +2,8 @@
 // install a factory so that the application creates theirs instead.
 #include <Velmar/HostShell.h>
 
+#include "host/Replaceable.h"
+
 namespace Velmar::Brindle {
 
 namespace {
@@ -11,7 +13,7 @@ DecorationManager* defaultFactory(QMenuBar* menuBar, int mdiMode)
     return new DecorationManager(menuBar, mdiMode);
 }
 
-DecorationManager::Factory gFactory = defaultFactory;
+Private::Replaceable<DecorationManager::Factory> gFactory(defaultFactory);
 DecorationManager* gCurrent = nullptr;
 
 } // namespace
@@ -49,14 +51,12 @@ QWidget* DecorationManager::GetHiddenDefaultParent()
 
 DecorationManager* DecorationManager::Create(QMenuBar* menuBar, int mdiMode)
 {
-    return gFactory(menuBar, mdiMode);
+    return gFactory.get()(menuBar, mdiMode);
 }
 
 DecorationManager::Factory DecorationManager::SetFactory(Factory factory)
 {
-    const Factory previous = gFactory;
-    gFactory = factory ? factory : defaultFactory;
-    return previous;
+    return gFactory.set(factory);
 }
 
 } // namespace Velmar::Brindle

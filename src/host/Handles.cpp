@@ -1,6 +1,8 @@
 // Memory handles: a master pointer at the head of a block that also records the size.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
+
 #include <QtGlobal>
 
 #include <cstddef>
@@ -90,14 +92,11 @@ private:
     std::unordered_set<Handle> m_live;
 };
 
-DefaultHandleAllocator& defaultAllocator()
+// Never destroyed: handles may still be disposed by other objects' destructors at exit.
+Private::Replaceable<HandleAllocator*>& allocatorSlot()
 {
-    // Never destroyed: handles may still be disposed by other objects' destructors at exit.
-    static auto* allocator = new DefaultHandleAllocator;
-    return *allocator;
+    return Private::replaceableInstance<HandleAllocator, DefaultHandleAllocator>();
 }
-
-HandleAllocator* gAllocator = nullptr;
 
 } // namespace
 
@@ -105,14 +104,12 @@ HandleAllocator::~HandleAllocator() = default;
 
 HandleAllocator* HandleAllocator::Get()
 {
-    return gAllocator ? gAllocator : &defaultAllocator();
+    return allocatorSlot().get();
 }
 
 HandleAllocator* HandleAllocator::SetInstance(HandleAllocator* allocator)
 {
-    HandleAllocator* previous = Get();
-    gAllocator = allocator;
-    return previous;
+    return allocatorSlot().set(allocator);
 }
 
 Handle TxPtrToHand(const void* data, Size size)

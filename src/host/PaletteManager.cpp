@@ -1,6 +1,8 @@
 // Named look-and-feel values; empty until the host fills or replaces the palette.
 #include <Velmar/HostShell.h>
 
+#include "host/Replaceable.h"
+
 #include <QHash>
 #include <QVariant>
 
@@ -9,18 +11,6 @@ namespace Velmar::Palette {
 struct PaletteManager::Values {
     QHash<QString, QVariant> byKey;
 };
-
-namespace {
-
-PaletteManager& defaultManager()
-{
-    static auto* manager = new PaletteManager; // never destroyed: usable until the process ends
-    return *manager;
-}
-
-PaletteManager* gManager = nullptr;
-
-} // namespace
 
 PaletteManager::PaletteManager() : m_values(new Values) {}
 
@@ -101,14 +91,12 @@ void PaletteManager::Clear()
 
 PaletteManager* PaletteManager::Instance()
 {
-    return gManager ? gManager : &defaultManager();
+    return Private::replaceableInstance<PaletteManager>().get();
 }
 
 PaletteManager* PaletteManager::SetInstance(PaletteManager* manager)
 {
-    PaletteManager* previous = Instance();
-    gManager = manager;
-    return previous;
+    return Private::replaceableInstance<PaletteManager>().set(manager);
 }
 
 } // namespace Velmar::Palette

@@ -1,6 +1,8 @@
 // The default screen manager: Qt's screens, numbered in the order Qt lists them.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
+
 #include <QApplication>
 #include <QGuiApplication>
 #include <QMenuBar>
@@ -28,14 +30,6 @@ SInt16 styledMenuBarHeight()
     probe.addMenu(QStringLiteral("File"));
     return SInt16(probe.sizeHint().height());
 }
-
-AScreenManOS& defaultManager()
-{
-    static auto* manager = new AScreenManOS; // never destroyed: usable until the process ends
-    return *manager;
-}
-
-AScreenManOS* gManager = nullptr;
 
 } // namespace
 
@@ -107,14 +101,12 @@ QRect AScreenManOS::GetUsableRectForPoint(const QPoint& globalPoint) const
 
 AScreenManOS* AScreenManOS::Get()
 {
-    return gManager ? gManager : &defaultManager();
+    return Private::replaceableInstance<AScreenManOS>().get();
 }
 
 AScreenManOS* AScreenManOS::SetInstance(AScreenManOS* manager)
 {
-    AScreenManOS* previous = Get();
-    gManager = manager;
-    return previous;
+    return Private::replaceableInstance<AScreenManOS>().set(manager);
 }
 
 } // namespace Velmar

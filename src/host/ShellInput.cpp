@@ -1,6 +1,7 @@
 // The shell's view of the system's left mouse button.
 #include <Velmar/HostShell.h>
 
+#include "host/Replaceable.h"
 #include "platform/Platform.h"
 
 namespace Velmar::Brindle {
@@ -12,20 +13,18 @@ bool defaultLeftButton()
     return Private::Platform::isSystemLeftButtonDown();
 }
 
-LeftButtonSource gLeftButtonSource = defaultLeftButton;
+Private::Replaceable<LeftButtonSource> gLeftButtonSource(defaultLeftButton);
 
 } // namespace
 
 bool isLeftButtonDown_sys()
 {
-    return gLeftButtonSource();
+    return gLeftButtonSource.get()();
 }
 
 LeftButtonSource SetLeftButtonSource(LeftButtonSource source)
 {
-    const LeftButtonSource previous = gLeftButtonSource;
-    gLeftButtonSource = source ? source : defaultLeftButton;
-    return previous;
+    return gLeftButtonSource.set(source);
 }
 
 } // namespace Velmar::Brindle

@@ -1,6 +1,8 @@
 // The localised text table: untranslated keys stand for themselves.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
+
 #include <QtGlobal>
 
 #include <QFile>
@@ -13,18 +15,6 @@ namespace Velmar {
 struct TextTable::Entries {
     QHash<QString, QString> texts;
 };
-
-namespace {
-
-TextTable& defaultTable()
-{
-    static auto* table = new TextTable; // never destroyed: usable until the process ends
-    return *table;
-}
-
-TextTable* gTable = nullptr;
-
-} // namespace
 
 TextTable::~TextTable()
 {
@@ -85,14 +75,12 @@ bool TextTable::LoadJsonFile(const QString& path)
 
 TextTable* TextTable::Get()
 {
-    return gTable ? gTable : &defaultTable();
+    return Private::replaceableInstance<TextTable>().get();
 }
 
 TextTable* TextTable::SetInstance(TextTable* table)
 {
-    TextTable* previous = Get();
-    gTable = table;
-    return previous;
+    return Private::replaceableInstance<TextTable>().set(table);
 }
 
 TxText::TxText(const QString& text) : m_text(text), m_utf8(text.toUtf8()) {}

@@ -1,6 +1,7 @@
 // The tick counter and the foreground query, each replaceable by the host.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
 #include "platform/Platform.h"
 
 #include <chrono>
@@ -23,33 +24,29 @@ bool qtForeground()
     return Private::Platform::isApplicationInForeground();
 }
 
-TickSource gTickSource = steadyTicks;
-ForegroundSource gForegroundSource = qtForeground;
+Private::Replaceable<TickSource> gTickSource(steadyTicks);
+Private::Replaceable<ForegroundSource> gForegroundSource(qtForeground);
 
 } // namespace
 
 UInt32 TxGetTicks()
 {
-    return gTickSource();
+    return gTickSource.get()();
 }
 
 TickSource SetTickSource(TickSource source)
 {
-    const TickSource previous = gTickSource;
-    gTickSource = source ? source : steadyTicks;
-    return previous;
+    return gTickSource.set(source);
 }
 
 bool isRunningInForeground()
 {
-    return gForegroundSource();
+    return gForegroundSource.get()();
 }
 
 ForegroundSource SetForegroundSource(ForegroundSource source)
 {
-    const ForegroundSource previous = gForegroundSource;
-    gForegroundSource = source ? source : qtForeground;
-    return previous;
+    return gForegroundSource.set(source);
 }
 
 } // namespace Velmar

@@ -1,6 +1,8 @@
 // The host's exception class and its log.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
+
 #include <QtGlobal>
 
 namespace Velmar {
@@ -13,7 +15,7 @@ void defaultXErrorLogger(const XError& error)
               int(error.GetLine()), error.GetFile());
 }
 
-XErrorLogger gLogger = defaultXErrorLogger;
+Private::Replaceable<XErrorLogger> gLogger(defaultXErrorLogger);
 
 } // namespace
 
@@ -37,14 +39,12 @@ const char* XError::GetType() const
 
 void LogXError(const XError& error)
 {
-    gLogger(error);
+    gLogger.get()(error);
 }
 
 XErrorLogger SetXErrorLogger(XErrorLogger logger)
 {
-    const XErrorLogger previous = gLogger;
-    gLogger = logger ? logger : defaultXErrorLogger;
-    return previous;
+    return gLogger.set(logger);
 }
 
 } // namespace Velmar

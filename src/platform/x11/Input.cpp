@@ -62,9 +62,13 @@ bool isAsyncKeyDown(int virtualKey)
 
 bool isCapsLockToggled()
 {
-    UInt8 state[256];
-    currentState(state);
-    return (state[VirtualKey::Capital] & 0x01) != 0;
+    // Asked on every modifier query: only the pointer query, not the whole keyboard.
+    if (XcbKeyboard* keyboard = windowSystemKeyboard()) {
+        bool toggled = false;
+        if (keyboard->queryCapsLock(toggled))
+            return toggled;
+    }
+    return InputTracker::instance().isToggled(VirtualKey::Capital);
 }
 
 void getKeyboardState(UInt8 state[256])

@@ -147,18 +147,43 @@ void XcbKeyboard::refreshKeymap()
     std::free(mapping);
 }
 
-bool XcbKeyboard::queryPointerMask(UInt16& mask)
+namespace {
+
+// Sends the pointer query without waiting, so that it can share a round trip.
+bool sendPointerQuery(xcb_connection_t* c, xcb_query_pointer_cookie_t& cookie)
 {
-    auto* c = static_cast<xcb_connection_t*>(m_connection);
     const xcb_screen_t* screen = xcb_setup_roots_iterator(xcb_get_setup(c)).data;
     if (!screen)
         return false;
-    xcb_query_pointer_reply_t* reply =
-        xcb_query_pointer_reply(c, xcb_query_pointer(c, screen->root), nullptr);
+    cookie = xcb_query_pointer(c, screen->root);
+    return true;
+}
+
+bool pointerMaskReply(xcb_connection_t* c, xcb_query_pointer_cookie_t cookie, UInt16& mask)
+{
+    xcb_query_pointer_reply_t* reply = xcb_query_pointer_reply(c, cookie, nullptr);
     if (!reply)
         return false;
     mask = reply->mask;
     std::free(reply);
+    return true;
+}
+
+} // namespace
+
+bool XcbKeyboard::queryPointerMask(UInt16& mask)
+{
+    auto* c = static_cast<xcb_connection_t*>(m_connection);
+    xcb_query_pointer_cookie_t cookie;
+    return sendPointerQuery(c, cookie) && pointerMaskReply(c, cookie, mask);
+}
+
+bool XcbKeyboard::queryCapsLock(bool& toggled)
+{
+    UInt16 mask = 0;
+    if (!queryPointerMask(mask))
+        return false;
+    toggled = (mask & XCB_MOD_MASK_LOCK) != 0;
     return true;
 }
 
@@ -167,11 +192,15 @@ bool XcbKeyboard::queryState(UInt8 state[256])
     std::memset(state, 0, 256);
     refreshKeymap();
     auto* c = static_cast<xcb_connection_t*>(m_connection);
-    xcb_query_keymap_reply_t* keymap = xcb_query_keymap_reply(c, xcb_query_keymap(c), nullptr);
+    // Both requests go out before either reply is awaited: one round trip, not two.
+    const xcb_query_keymap_cookie_t keymapCookie = xcb_query_keymap(c);
+    xcb_query_pointer_cookie_t pointerCookie;
+    const bool pointerSent = sendPointerQuery(c, pointerCookie);
+    xcb_query_keymap_reply_t* keymap = xcb_query_keymap_reply(c, keymapCookie, nullptr);
+    UInt16 mask = 0;
+    const bool havePointer = pointerSent && pointerMaskReply(c, pointerCookie, mask);
     if (!keymap)
         return false;
-    UInt16 mask = 0;
-    const bool havePointer = queryPointerMask(mask);
     const bool numLockOn = havePointer && (mask & m_numLockMask) != 0;
 
     for (int keycode = 0; keycode < 256; ++keycode) {
@@ -233,6 +262,10 @@ bool XcbKeyboard::queryState(UInt8 state[256])
     return false;
 }
 bool XcbKeyboard::queryPointerMask(UInt16&)
+{
+    return false;
+}
+bool XcbKeyboard::queryCapsLock(bool&)
 {
     return false;
 }

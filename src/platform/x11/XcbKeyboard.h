@@ -15,6 +15,9 @@ public:
     // server did not answer.
     bool queryState(UInt8 state[256]);
     bool queryPointerMask(UInt16& mask);
+    // Caps Lock alone, from the pointer query's modifier mask: one round trip. False when
+    // the server did not answer.
+    bool queryCapsLock(bool& toggled);
 
     // The virtual key of the key that types `character`; 0 when no key does.
     int virtualKeyForCharacter(unsigned char character);
