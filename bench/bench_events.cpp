@@ -1,14 +1,11 @@
 // Posting an event and taking it out of the queue again, with a queue already holding N
 // other events. The queue is a plain list searched from the front, so the figures show
 // how a round trip grows with what waits ahead of it.
+#include "BenchSupport.h"
+
 #include "events/EventQueue.h"
 
 #include <Velmar/Events.h>
-#include <Velmar/HostCore.h>
-
-#include <QApplication>
-
-#include <benchmark/benchmark.h>
 
 using namespace Velmar;
 using Private::EventQueueItemSmartPtr;
@@ -70,30 +67,11 @@ void ScheduleTake(benchmark::State& state)
     finish(state);
 }
 
-// Ten thousand queued events pass the live-object warning: answer it without a dialog.
-class IgnoreAssertions : public AutomationListener {
-public:
-    QString AnswerDialog(const QString&, const QString&, const QString&) override
-    {
-        return QStringLiteral("Ignore All");
-    }
-};
-
 } // namespace
 
 BENCHMARK(PostTake)->Name("Events/PostTake")->Arg(0)->Arg(100)->Arg(10000);
 BENCHMARK(ScheduleTake)->Name("Events/ScheduleTake")->Arg(0)->Arg(100)->Arg(10000);
 
-int main(int argc, char** argv)
-{
-    // PostEvent asks Qt for the mouse position and the keyboard modifiers.
-    QApplication app(argc, argv);
-    IgnoreAssertions ignore;
-    AutomationListenerManager::SetListener(&ignore);
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
-}
+// Ten thousand queued events pass the live-object warning: the shared main answers it
+// without a dialog.
+VELMAR_BENCHMARK_MAIN()

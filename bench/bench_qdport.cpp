@@ -1,26 +1,20 @@
 // Ports, pens and patterns against raw Qt: each "QD/<case>" does through the Toolbox calls
 // what its "Qt/<case>" baseline does with a QPainter on a QImage of the same size.
+#include "BenchSupport.h"
+
 #include <Velmar/QDShapes.h>
-#include <Velmar/QtGrafPort.h>
-#include <Velmar/QuickDraw.h>
 
 #include "foundation/Conversions.h"
 
-#include <QGuiApplication>
-#include <QImage>
-#include <QPainter>
 #include <QPixmap>
 
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-
 using namespace Velmar;
+using VelmarBench::BenchWorld;
+using VelmarBench::kHeight;
+using VelmarBench::kWidth;
 
 namespace {
 
-constexpr int kWidth = 800;
-constexpr int kHeight = 600;
 constexpr int kSide = 32;
 
 // Rectangles walk over the whole world so that neither side profits from one hot spot.
@@ -35,18 +29,16 @@ struct Walk {
     }
 };
 
-GrafPtr newWorld()
-{
-    const Rect r = Private::makeRect(0, 0, kWidth, kHeight);
-    GrafPtr world = nullptr;
-    NewGWorld(&world, 32, &r, nullptr, nullptr, 0);
-    SetPort(world);
-    const RGBColor ink(0x1000, 0x8000, 0xF000);
-    const RGBColor paper(0xFFFF, 0xF000, 0x2000);
-    RGBForeColor(&ink);
-    RGBBackColor(&paper);
-    return world;
-}
+// The world in the colours the Qt side paints with.
+struct InkedWorld : BenchWorld {
+    InkedWorld()
+    {
+        const RGBColor ink(0x1000, 0x8000, 0xF000);
+        const RGBColor paper(0xFFFF, 0xF000, 0x2000);
+        RGBForeColor(&ink);
+        RGBBackColor(&paper);
+    }
+};
 
 // The 8x8 two-colour texture the pattern case paints with on the Qt side.
 QPixmap grayTexture()
@@ -60,7 +52,7 @@ QPixmap grayTexture()
 
 void qdRects(benchmark::State& state, void (*draw)(const Rect*), bool pattern)
 {
-    GrafPtr world = newWorld();
+    InkedWorld world;
     if (pattern)
         PenPat(GetQDGlobalsGray(nullptr));
     Walk walk;
@@ -68,20 +60,17 @@ void qdRects(benchmark::State& state, void (*draw)(const Rect*), bool pattern)
         const Rect r = Private::toRect(walk.next());
         draw(&r);
     }
-    benchmark::DoNotOptimize(world->image()->constBits());
-    DisposeGWorld(world);
+    benchmark::DoNotOptimize(world.port()->image()->constBits());
 }
 
 void qtRects(benchmark::State& state, const QBrush& brush)
 {
-    QImage image(kWidth, kHeight, QImage::Format_ARGB32_Premultiplied);
-    image.fill(Qt::white);
-    QPainter painter(&image);
+    VelmarBench::QtCanvas canvas;
     Walk walk;
     for (auto _ : state)
-        painter.fillRect(walk.next(), brush);
-    painter.end();
-    benchmark::DoNotOptimize(image.constBits());
+        canvas.painter().fillRect(walk.next(), brush);
+    canvas.painter().end();
+    benchmark::DoNotOptimize(canvas.image().constBits());
 }
 
 void QD_PaintRect32(benchmark::State& state)
@@ -117,19 +106,17 @@ void Qt_PaintRectPattern32(benchmark::State& state)
 // State changes run with the painter active, as they do between drawing calls.
 void QD_SetPort(benchmark::State& state)
 {
-    GrafPtr a = newWorld();
-    GrafPtr b = newWorld();
-    const GrafPtr ports[2] = {a, b};
+    InkedWorld a;
+    InkedWorld b;
+    const GrafPtr ports[2] = {a.port(), b.port()};
     int i = 0;
     for (auto _ : state)
         SetPort(ports[++i & 1]);
-    DisposeGWorld(a);
-    DisposeGWorld(b);
 }
 
 void QD_PenSize(benchmark::State& state)
 {
-    GrafPtr world = newWorld();
+    InkedWorld world;
     const Rect r = Private::makeRect(0, 0, 1, 1);
     PaintRect(&r);
     SInt16 size = 1;
@@ -137,19 +124,17 @@ void QD_PenSize(benchmark::State& state)
         size = SInt16(3 - size); // 1, 2, 1, ...: every call changes the pen
         PenSize(size, size);
     }
-    DisposeGWorld(world);
 }
 
 void QD_RGBForeColor(benchmark::State& state)
 {
-    GrafPtr world = newWorld();
+    InkedWorld world;
     const Rect r = Private::makeRect(0, 0, 1, 1);
     PaintRect(&r);
     const RGBColor colours[2] = {RGBColor(0xFFFF, 0, 0), RGBColor(0, 0, 0xFFFF)};
     int i = 0;
     for (auto _ : state)
         RGBForeColor(&colours[++i & 1]);
-    DisposeGWorld(world);
 }
 
 } // namespace
@@ -164,15 +149,4 @@ BENCHMARK(QD_SetPort)->Name("QD/SetPort");
 BENCHMARK(QD_PenSize)->Name("QD/PenSize");
 BENCHMARK(QD_RGBForeColor)->Name("QD/RGBForeColor");
 
-int main(int argc, char** argv)
-{
-    if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM") && qEnvironmentVariableIsEmpty("DISPLAY"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    QGuiApplication app(argc, argv);
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
-}
+VELMAR_BENCHMARK_MAIN()

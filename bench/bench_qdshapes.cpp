@@ -1,61 +1,18 @@
 // Shape and region drawing against raw Qt doing the same work on an image of the same size:
 // "QD/<case>" is the QuickDraw call on an 800x600 offscreen world, "Qt/<case>" the QPainter
 // baseline in the same process.
+#include "BenchSupport.h"
+
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
-#include <Velmar/QtGrafPort.h>
-#include <Velmar/QuickDraw.h>
 
-#include <QGuiApplication>
-#include <QImage>
-#include <QPainter>
 #include <QRegion>
 
-#include <benchmark/benchmark.h>
-
 using namespace Velmar;
+using VelmarBench::BenchWorld;
+using VelmarBench::QtCanvas;
 
 namespace {
-
-constexpr int kWidth = 800;
-constexpr int kHeight = 600;
-
-// An 800x600 offscreen world, current while it lives.
-class BenchWorld {
-public:
-    BenchWorld()
-    {
-        const Rect bounds{0, 0, kHeight, kWidth};
-        NewGWorld(&m_port, 32, &bounds, nullptr, nullptr, 0);
-        SetPort(m_port);
-    }
-    ~BenchWorld()
-    {
-        SetPort(nullptr);
-        DisposeGWorld(m_port);
-    }
-
-private:
-    GrafPtr m_port = nullptr;
-};
-
-// The raw-Qt side: a painter on an image of the same size and format, with the pen a
-// QuickDraw port starts with.
-class QtCanvas {
-public:
-    QtCanvas() : m_image(kWidth, kHeight, QImage::Format_ARGB32_Premultiplied)
-    {
-        m_image.fill(Qt::white);
-        m_painter.begin(&m_image);
-        m_painter.setPen(QPen(Qt::black, 1.0, Qt::SolidLine, Qt::SquareCap, Qt::BevelJoin));
-        m_painter.setBrush(Qt::NoBrush);
-    }
-    QPainter& painter() { return m_painter; }
-
-private:
-    QImage m_image;
-    QPainter m_painter;
-};
 
 // Fifty disjoint 30x30 squares in a 10x5 grid.
 QRegion fiftyRects()
@@ -132,15 +89,4 @@ BENCHMARK(Qt_PaintRgn50)->Name("Qt/PaintRgn50");
 
 } // namespace
 
-int main(int argc, char** argv)
-{
-    if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    QGuiApplication app(argc, argv);
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
-}
+VELMAR_BENCHMARK_MAIN()
