@@ -4,8 +4,6 @@
 
 #include <Velmar/Diagnostics.h>
 
-Q_DECLARE_METATYPE(Rect)
-
 using namespace Velmar;
 using namespace ShapeTest;
 
@@ -29,80 +27,55 @@ class TestRectUtils : public QObject {
 private Q_SLOTS:
     void initTestCase() { SetLogCategory(kLogQuickDraw, true); }
 
-    void emptyRect_data()
-    {
-        QTest::addColumn<Rect>("r");
-        QTest::addColumn<bool>("empty");
-        QTest::newRow("normal") << R(0, 0, 10, 10) << false;
-        QTest::newRow("one pixel") << R(5, 5, 6, 6) << false;
-        QTest::newRow("zero height") << R(10, 10, 10, 20) << true;
-        QTest::newRow("zero width") << R(10, 20, 30, 20) << true;
-        QTest::newRow("inverted") << R(10, 10, 0, 0) << true;
-    }
     void emptyRect()
     {
-        QFETCH(Rect, r);
-        QFETCH(bool, empty);
-        QCOMPARE(EmptyRect(&r) != 0, empty);
+        for (const auto& [r, empty] : {std::pair{R(0, 0, 10, 10), false}, {R(5, 5, 6, 6), false},
+                                       {R(10, 10, 10, 20), true}, {R(10, 20, 30, 20), true},
+                                       {R(10, 10, 0, 0), true}})
+            QVERIFY2((EmptyRect(&r) != 0) == empty, show(r));
     }
 
     // SetRect takes left, top, right, bottom; OffsetRect and InsetRect move and shrink by
     // (dh, dv); an inset that leaves nothing gives the all-zero rectangle.
-    void setOffsetInset_data()
-    {
-        QTest::addColumn<int>("op"); // 0 SetRect(dh, dv, 3, 4), 1 OffsetRect, 2 InsetRect
-        QTest::addColumn<Rect>("in");
-        QTest::addColumn<int>("dh");
-        QTest::addColumn<int>("dv");
-        QTest::addColumn<Rect>("out");
-        QTest::newRow("set") << 0 << R(9, 9, 9, 9) << 1 << 2 << R(2, 1, 4, 3);
-        QTest::newRow("offset") << 1 << R(10, 20, 30, 40) << 5 << -5 << R(5, 25, 25, 45);
-        QTest::newRow("shrink") << 2 << R(0, 0, 10, 10) << 2 << 3 << R(3, 2, 7, 8);
-        QTest::newRow("grow") << 2 << R(0, 0, 10, 10) << -1 << -2 << R(-2, -1, 12, 11);
-        QTest::newRow("width gone") << 2 << R(0, 0, 10, 10) << 5 << 0 << R(0, 0, 0, 0);
-        QTest::newRow("height gone") << 2 << R(5, 5, 10, 50) << 0 << 3 << R(0, 0, 0, 0);
-        QTest::newRow("one left") << 2 << R(0, 0, 11, 11) << 5 << 5 << R(5, 5, 6, 6);
-    }
     void setOffsetInset()
     {
-        QFETCH(int, op);
-        QFETCH(Rect, in);
-        QFETCH(int, dh);
-        QFETCH(int, dv);
-        QFETCH(Rect, out);
-        if (op == 0)
-            SetRect(&in, short(dh), short(dv), 3, 4);
-        else
-            (op == 1 ? OffsetRect : InsetRect)(&in, short(dh), short(dv));
-        QVERIFY2(same(in, out), show(in));
+        struct Case {
+            int op; // 0 SetRect(dh, dv, 3, 4), 1 OffsetRect, 2 InsetRect
+            Rect in;
+            int dh, dv;
+            Rect out;
+        };
+        for (Case c : {Case{0, R(9, 9, 9, 9), 1, 2, R(2, 1, 4, 3)},
+                       Case{1, R(10, 20, 30, 40), 5, -5, R(5, 25, 25, 45)},
+                       Case{2, R(0, 0, 10, 10), 2, 3, R(3, 2, 7, 8)},
+                       Case{2, R(0, 0, 10, 10), -1, -2, R(-2, -1, 12, 11)},
+                       Case{2, R(0, 0, 10, 10), 5, 0, R(0, 0, 0, 0)},
+                       Case{2, R(5, 5, 10, 50), 0, 3, R(0, 0, 0, 0)},
+                       Case{2, R(0, 0, 11, 11), 5, 5, R(5, 5, 6, 6)}}) {
+            if (c.op == 0)
+                SetRect(&c.in, short(c.dh), short(c.dv), 3, 4);
+            else
+                (c.op == 1 ? OffsetRect : InsetRect)(&c.in, short(c.dh), short(c.dv));
+            QVERIFY2(same(c.in, c.out), show(c.in));
+        }
     }
 
-    void sectRect_data()
-    {
-        QTest::addColumn<Rect>("a");
-        QTest::addColumn<Rect>("b");
-        QTest::addColumn<int>("result");
-        QTest::addColumn<Rect>("out");
-        QTest::newRow("overlap") << R(0, 0, 10, 10) << R(5, 5, 20, 20) << 1 << R(5, 5, 10, 10);
-        QTest::newRow("inside") << R(0, 0, 10, 10) << R(2, 3, 4, 5) << 1 << R(2, 3, 4, 5);
-        QTest::newRow("apart") << R(0, 0, 10, 10) << R(20, 20, 30, 30) << 0 << R(0, 0, 0, 0);
-        QTest::newRow("touching") << R(0, 0, 10, 10) << R(0, 10, 10, 20) << 0 << R(0, 0, 0, 0);
-    }
+    // Symmetric; an empty answer clears the result, except that an empty or null input
+    // leaves it alone; the result may alias an input.
     void sectRect()
     {
-        QFETCH(Rect, a);
-        QFETCH(Rect, b);
-        QFETCH(int, result);
-        QFETCH(Rect, out);
-        Rect got = R(-7, -7, -7, -7);
-        QCOMPARE(int(SectRect(&a, &b, &got)), result);
-        QVERIFY2(same(got, out), show(got));
-        got = R(-7, -7, -7, -7);
-        QCOMPARE(int(SectRect(&b, &a, &got)), result); // symmetric
-        QVERIFY2(same(got, out), show(got));
-    }
-    void sectRectLeavesResultForEmptyOrNullInput()
-    {
+        for (const auto& [a, b, result, out] :
+             {std::tuple{R(0, 0, 10, 10), R(5, 5, 20, 20), 1, R(5, 5, 10, 10)},
+              {R(0, 0, 10, 10), R(2, 3, 4, 5), 1, R(2, 3, 4, 5)},
+              {R(0, 0, 10, 10), R(20, 20, 30, 30), 0, R(0, 0, 0, 0)},
+              {R(0, 0, 10, 10), R(0, 10, 10, 20), 0, R(0, 0, 0, 0)}}) {
+            Rect got = R(-7, -7, -7, -7);
+            QCOMPARE(int(SectRect(&a, &b, &got)), result);
+            QVERIFY2(same(got, out), show(got));
+            got = R(-7, -7, -7, -7);
+            QCOMPARE(int(SectRect(&b, &a, &got)), result);
+            QVERIFY2(same(got, out), show(got));
+        }
         const Rect sentinel = R(1, 2, 3, 4);
         const Rect empty = R(10, 10, 10, 20), full = R(0, 0, 50, 50);
         Rect out = sentinel;
@@ -113,14 +86,13 @@ private Q_SLOTS:
         QCOMPARE(SectRect(&full, nullptr, &out), 0);
         QVERIFY(same(out, sentinel));
         QCOMPARE(SectRect(&full, &full, nullptr), 1); // no result slot: answer only
-        // The result may alias an input.
         Rect a = R(0, 0, 10, 10);
         const Rect b = R(5, 5, 20, 20);
         QCOMPARE(SectRect(&a, &b, &a), 1);
         QVERIFY(same(a, R(5, 5, 10, 10)));
     }
 
-    void unionRect()
+    void unionPt2RectAndPtInRect()
     {
         const Rect a = R(0, 0, 10, 10), b = R(20, 30, 25, 35);
         Rect out{};
@@ -130,19 +102,11 @@ private Q_SLOTS:
         QVERIFY(same(out, a));
         UnionRect(nullptr, &b, &out);
         QVERIFY(same(out, b));
-    }
-
-    void ptInRectExcludesRightAndBottomEdges()
-    {
-        const Rect r = R(10, 10, 20, 20);
-        QCOMPARE(PtInRect(P(10, 10), &r), 1);
-        QCOMPARE(PtInRect(P(19, 19), &r), 1);
-        QCOMPARE(PtInRect(P(20, 15), &r), 0);
-        QCOMPARE(PtInRect(P(15, 20), &r), 0);
-        QCOMPARE(PtInRect(P(9, 15), &r), 0);
-        Rect out{};
         Pt2Rect(P(30, 5), P(10, 25), &out); // any two corners, in any order
         QVERIFY2(same(out, R(5, 10, 25, 30)), show(out));
+        const Rect r = R(10, 10, 20, 20); // right and bottom edges are outside
+        for (const auto& [h, v, in] : {std::tuple{10, 10, 1}, {19, 19, 1}, {20, 15, 0}, {15, 20, 0}, {9, 15, 0}})
+            QVERIFY2(PtInRect(P(h, v), &r) == in, QByteArray::number(h) + "," + QByteArray::number(v));
     }
 
     void nullPointersAreSafe()

@@ -4,13 +4,10 @@
 
 #include <Velmar/Diagnostics.h>
 
-#include "quickdraw/ArcAngles.h"
 #include "quickdraw/GrafPortPrivate.h"
 
 using namespace Velmar;
 using namespace ShapeTest;
-
-Q_DECLARE_METATYPE(Rect)
 
 namespace {
 
@@ -30,26 +27,17 @@ private Q_SLOTS:
 
     // The frame is the band w pixels deep along every edge, corners included, in the pen's
     // colour; a pen wider than half the rectangle covers all of it, never more.
-    void frameRect_data()
-    {
-        QTest::addColumn<int>("w");
-        QTest::addColumn<Rect>("r");
-        QTest::newRow("1") << 1 << R(10, 10, 20, 20);
-        QTest::newRow("2") << 2 << R(10, 10, 30, 40);
-        QTest::newRow("3") << 3 << R(10, 10, 30, 40);
-        QTest::newRow("4") << 4 << R(10, 10, 30, 40);
-        QTest::newRow("wider than half") << 5 << R(10, 10, 14, 13);
-    }
     void frameRect()
     {
-        QFETCH(int, w);
-        QFETCH(Rect, r);
-        World world;
-        PenSize(short(w), short(w));
-        FrameRect(&r);
-        const QSet<QPoint> got = world.touched(), band = framePixels(r.left, r.top, r.right, r.bottom, w);
-        QVERIFY2(got == band, describe(got) + " / " + describe(band));
-        QCOMPARE(world.pixel(r.left, r.top), qRgb(0, 0, 0));
+        for (const auto& [w, r] : {std::pair{1, R(10, 10, 20, 20)}, {2, R(10, 10, 30, 40)},
+                                   {3, R(10, 10, 30, 40)}, {4, R(10, 10, 30, 40)}, {5, R(10, 10, 14, 13)}}) {
+            World world;
+            PenSize(short(w), short(w));
+            FrameRect(&r);
+            const QSet<QPoint> got = world.touched(), band = framePixels(r.left, r.top, r.right, r.bottom, w);
+            QVERIFY2(got == band, describe(got) + " / " + describe(band));
+            QCOMPARE(world.pixel(r.left, r.top), qRgb(0, 0, 0));
+        }
     }
 
     // Shapes are given in local coordinates; the origin moves them on the image.
@@ -135,68 +123,40 @@ private Q_SLOTS:
         QVERIFY(world.touched().isEmpty());
     }
 
-    void lineToPenLocationDrawsOnePoint()
+    // A line to the pen location is one point; lines are centred on their points and move
+    // the pen; Move moves it without drawing.
+    void linesAreCentredOnTheirPoints()
     {
         World world;
         MoveTo(30, 40);
         LineTo(30, 40);
         QCOMPARE(world.touched(), QSet<QPoint>{QPoint(30, 40)});
-        Point pen{};
-        GetPen(&pen);
-        QCOMPARE(pen.h, 30);
-        QCOMPARE(pen.v, 40);
-    }
-
-    void linesAreCentredOnTheirPoints()
-    {
-        World world;
         MoveTo(5, 5);
         LineTo(15, 5);
-        QCOMPARE(world.touched(), rectPixels(5, 5, 16, 6));
         Line(0, 10); // from the pen location (15, 5) down to (15, 15)
-        QCOMPARE(world.touched(), rectPixels(5, 5, 16, 6) + rectPixels(15, 5, 16, 16));
-        Move(-10, 0); // pen to (5, 15), nothing drawn
+        Move(-10, 0);
+        QCOMPARE(world.touched(), rectPixels(5, 5, 16, 6) + rectPixels(15, 5, 16, 16) + QSet{QPoint(30, 40)});
         Point pen{};
         GetPen(&pen);
         QVERIFY(pen.h == 5 && pen.v == 15);
-        QCOMPARE(world.touched().size(), 21);
     }
 
-    void arcAngleConversion_data()
-    {
-        QTest::addColumn<int>("start");
-        QTest::addColumn<int>("arc");
-        QTest::addColumn<int>("qtStart");
-        QTest::addColumn<int>("qtSpan");
-        QTest::newRow("3 to 6 o'clock") << 90 << 90 << 270 << 90;
-        QTest::newRow("counter-clockwise") << 0 << -90 << 180 << -90;
-        QTest::newRow("full circle") << 0 << 360 << 90 << 360;
-        QTest::newRow("large start") << 720 << 45 << 45 << 45;
-    }
-    void arcAngleConversion()
-    {
-        QFETCH(int, start);
-        QFETCH(int, arc);
-        QFETCH(int, qtStart);
-        QFETCH(int, qtSpan);
-        const Private::QtArc a = Private::toQtArc(start, arc);
-        QCOMPARE(a.start, qtStart * 16);
-        QCOMPARE(a.span, qtSpan * 16);
-    }
-
-    // The quadrant from 12 o'clock to 3 o'clock: top-right of the centre.
+    // Toolbox angles run clockwise from 12 o'clock: each arc stays in its quadrant of the
+    // 80x80 oval (give or take the centre lines) and fills it.
     void paintArcQuadrant()
     {
-        World world;
-        const Rect r = R(0, 0, 80, 80);
-        PaintArc(&r, 0, 90);
-        const QSet<QPoint> got = world.touched();
-        QVERIFY(got.size() > 1000);
-        for (const QPoint& p : got)
-            QVERIFY2(p.x() >= 39 && p.y() <= 40, describe({p}));
-        QVERIFY(got.contains(QPoint(60, 20)));
-        QVERIFY(!got.contains(QPoint(20, 20)));
-        QVERIFY(!got.contains(QPoint(60, 60)));
+        const QRect topRight(38, 0, 42, 42), bottomRight(38, 38, 42, 42), topLeft(0, 0, 42, 42);
+        for (const auto& [start, arc, allowed, inside] :
+             {std::tuple{0, 90, topRight, QPoint(60, 20)}, {90, 90, bottomRight, QPoint(60, 60)},
+              {0, -90, topLeft, QPoint(20, 20)}, {900, 90, QRect(0, 38, 42, 42), QPoint(20, 60)},
+              {0, 360, QRect(0, 0, 80, 80), QPoint(60, 60)}}) {
+            World world;
+            const Rect r = R(0, 0, 80, 80);
+            PaintArc(&r, short(start), short(arc));
+            const QSet<QPoint> got = world.touched();
+            QVERIFY2(got.size() > 1000 && got.contains(inside), describe(got));
+            QVERIFY2((got - regionPixels(QRegion(allowed))).isEmpty(), describe(got));
+        }
     }
 
     void ovalsAndRoundRectsStayInTheirRectangle()
@@ -257,29 +217,24 @@ private Q_SLOTS:
         GrafPtr saved = nullptr;
         GetPort(&saved);
         SetPort(nullptr);
-        VelmarTest::LogCapture log;
         const Rect r = R(0, 0, 10, 10);
-        FrameRect(&r);
-        PaintRect(&r);
-        FrameOval(&r);
-        FrameRoundRect(&r, 2, 2);
-        MoveTo(1, 1);
-        Move(1, 1);
-        LineTo(1, 1);
-        Line(1, 1);
-        StdRect(kQDGrafVerbFrame, &r);
-        DrawLinesFromPointPairs({QPoint(0, 0), QPoint(1, 1)});
-        for (const char* text : {"warning: FrameRect: cannot get current port",
-                                 "warning: PaintRect: Can't get current port!",
-                                 "warning: FrameOval: cannot get current port",
-                                 "warning: FrameRoundRect: cannot get current port",
-                                 "warning: MoveTo: cannot get current port",
-                                 "warning: Move: cannot get current port",
-                                 "warning: LineTo: cannot get current port",
-                                 "warning: Line: cannot get current port",
-                                 "warning: StdRect: cannot get current port",
-                                 "warning: DrawLinesFromPointPairs: cannot get Qt port"})
+        const QList<std::pair<const char*, std::function<void()>>> cases = {
+            {"warning: FrameRect: cannot get current port", [&] { FrameRect(&r); }},
+            {"warning: PaintRect: Can't get current port!", [&] { PaintRect(&r); }},
+            {"warning: FrameOval: cannot get current port", [&] { FrameOval(&r); }},
+            {"warning: FrameRoundRect: cannot get current port", [&] { FrameRoundRect(&r, 2, 2); }},
+            {"warning: MoveTo: cannot get current port", [] { MoveTo(1, 1); }},
+            {"warning: Move: cannot get current port", [] { Move(1, 1); }},
+            {"warning: LineTo: cannot get current port", [] { LineTo(1, 1); }},
+            {"warning: Line: cannot get current port", [] { Line(1, 1); }},
+            {"warning: StdRect: cannot get current port", [&] { StdRect(kQDGrafVerbFrame, &r); }},
+            {"warning: DrawLinesFromPointPairs: cannot get Qt port",
+             [] { DrawLinesFromPointPairs({QPoint(0, 0), QPoint(1, 1)}); }}};
+        for (const auto& [text, call] : cases) {
+            VelmarTest::LogCapture log;
+            call();
             QVERIFY2(log.contains(QString::fromLatin1(text)), text);
+        }
         SetPort(saved);
     }
 
