@@ -2,11 +2,11 @@
 #include <Velmar/Diagnostics.h>
 
 #include "foundation/DiagnosticsPrivate.h"
+#include "foundation/NameTable.h"
 #include "platform/Platform.h"
 
 #include <QtGlobal>
 
-#include <array>
 #include <cstdarg>
 #include <cstdio>
 
@@ -14,12 +14,7 @@ namespace Velmar {
 
 namespace {
 
-struct CategoryName {
-    UInt32 bit;
-    const char* name;
-};
-
-constexpr std::array<CategoryName, 9> kCategoryNames{{
+constexpr Private::NamedValue<UInt32> kCategoryNames[] = {
     {kLogUnknown, "Unknown"},
     {kLogWindowManagement, "WindowManagement"},
     {kLogEvents, "Events"},
@@ -29,7 +24,7 @@ constexpr std::array<CategoryName, 9> kCategoryNames{{
     {kLogNotImpl, "NotImpl"},
     {kLogMenus, "Menus"},
     {kLogActivation, "Activation"},
-}};
+};
 
 // Messages longer than this (with the terminator) are cut.
 constexpr std::size_t kLogMessageBufferSize = 1024;
@@ -56,11 +51,7 @@ void SetLogCategory(UInt32 category, bool on)
 
 const char* LogCategoryName(UInt32 category)
 {
-    for (const CategoryName& c : kCategoryNames) {
-        if (c.bit == category)
-            return c.name;
-    }
-    return "N/A";
+    return Private::nameOf(kCategoryNames, category, "N/A");
 }
 
 void VelmarLog(UInt32 category, const char* format, ...)

@@ -1,12 +1,12 @@
 #include "foundation/MessageHandler.h"
 
 #include "foundation/DiagnosticsPrivate.h"
+#include "foundation/NameTable.h"
 
 #include <QElapsedTimer>
 #include <QString>
 
 #include <algorithm>
-#include <array>
 #include <cstdlib>
 #include <cstring>
 
@@ -14,25 +14,16 @@ namespace Velmar::Private {
 
 namespace {
 
-struct TypePrefix {
-    QtMsgType type;
-    const char* label;
-};
-
-constexpr std::array<TypePrefix, 4> kPrefixes{{
+constexpr NamedValue<QtMsgType> kPrefixes[] = {
     {QtDebugMsg, "DEBUG"},
     {QtWarningMsg, "WARNING"},
     {QtCriticalMsg, "CRITICAL"},
     {QtFatalMsg, "FATAL"},
-}};
+};
 
 const char* typeLabel(QtMsgType type)
 {
-    for (const TypePrefix& p : kPrefixes) {
-        if (p.type == type)
-            return p.label;
-    }
-    return "UNKNOWN"; // QtInfoMsg and anything newer
+    return nameOf(kPrefixes, type, "UNKNOWN"); // QtInfoMsg and anything newer
 }
 
 // One buffer for the whole process, as the debugger channel wants a finished C string.

@@ -12,6 +12,9 @@
 #include <QSpinBox>
 #include <QVBoxLayout>
 
+#include <functional>
+#include <utility>
+
 namespace Velmar {
 
 namespace {
@@ -78,6 +81,16 @@ UInt32 currentValue(FeatureFlag flag)
     return Private::featureFlag(flag, kFeatureFlagQuery);
 }
 
+// Every flag at its default ("Optimum set") or off ("Test mode"); the refresh rate at 0.
+QHash<int, UInt32> presetValues(bool defaults)
+{
+    QHash<int, UInt32> values;
+    for (const Private::FeatureFlagInfo& info : Private::kFeatureFlags)
+        values.insert(int(info.flag), defaults ? info.defaultValue : 0);
+    values.insert(int(FeatureFlag::MaximumStatUpdateRate), 0);
+    return values;
+}
+
 } // namespace
 
 QtUIPrefDialog::QtUIPrefDialog(QWidget* parent)
@@ -122,21 +135,25 @@ QtUIPrefDialog::QtUIPrefDialog(QWidget* parent)
     rateRow->addWidget(m_statUpdateRate);
     groupLayouts[0]->addLayout(rateRow);
 
-    auto* buttons = new QVBoxLayout;
-    auto addButton = [&](const QString& text, auto slot) {
-        auto* button = new QPushButton(text, this);
-        button->setAutoDefault(false);
-        connect(button, &QPushButton::clicked, this, slot);
-        buttons->addWidget(button);
-        return button;
+    // The buttons, top to bottom; the first flips the risk mode and shows which it is in.
+    const std::pair<const char*, std::function<void()>> kButtons[] = {
+        {QT_TR_NOOP("Select Risk"), [this] { toggleRiskMode(); }},
+        {QT_TR_NOOP("Medium"), [this] { applyRiskLevel(1); }},
+        {QT_TR_NOOP("High"), [this] { applyRiskLevel(2); }},
+        {QT_TR_NOOP("Test mode"), [this] { setTestMode(); }},
+        {QT_TR_NOOP("Optimum\nset"), [this] { setOptimum(); }},
+        {QT_TR_NOOP("Reset"), [this] { resetToOpening(); }},
+        {QT_TR_NOOP("Cancel"), [this] { reject(); }},
     };
-    m_riskMode = addButton(tr("Select Risk"), [this] { toggleRiskMode(); });
-    addButton(tr("Medium"), [this] { applyRiskLevel(1); });
-    addButton(tr("High"), [this] { applyRiskLevel(2); });
-    addButton(tr("Test mode"), [this] { setTestMode(); });
-    addButton(tr("Optimum\nset"), [this] { setOptimum(); });
-    addButton(tr("Reset"), [this] { resetToOpening(); });
-    addButton(tr("Cancel"), [this] { reject(); });
+    auto* buttons = new QVBoxLayout;
+    for (const auto& [text, action] : kButtons) {
+        auto* button = new QPushButton(tr(text), this);
+        button->setAutoDefault(false);
+        connect(button, &QPushButton::clicked, this, action);
+        buttons->addWidget(button);
+        if (!m_riskMode)
+            m_riskMode = button;
+    }
     buttons->addStretch();
 
     auto* top = new QHBoxLayout(this);
@@ -160,19 +177,12 @@ void QtUIPrefDialog::applyRiskLevel(int risk)
 
 void QtUIPrefDialog::setOptimum()
 {
-    QHash<int, UInt32> values;
-    for (const Private::FeatureFlagInfo& info : Private::kFeatureFlags)
-        values.insert(int(info.flag), info.defaultValue);
-    values.insert(int(FeatureFlag::MaximumStatUpdateRate), 0);
-    showValues(values);
+    showValues(presetValues(true));
 }
 
 void QtUIPrefDialog::setTestMode()
 {
-    QHash<int, UInt32> values;
-    for (const Private::FeatureFlagInfo& info : Private::kFeatureFlags)
-        values.insert(int(info.flag), 0);
-    showValues(values);
+    showValues(presetValues(false));
 }
 
 void QtUIPrefDialog::resetToOpening()
