@@ -9,7 +9,7 @@
 #include <QSettings>
 #include <QTimer>
 
-#include <memory>
+#include <algorithm>
 
 namespace VelmarTest {
 
@@ -32,24 +32,16 @@ void LogCapture::hook(const char* line, void* context)
     static_cast<LogCapture*>(context)->m_lines.append(QString::fromLocal8Bit(line));
 }
 
-bool LogCapture::contains(const QString& fragment) const
-{
-    return count(fragment) > 0;
-}
-
 int LogCapture::count(const QString& fragment) const
 {
-    int n = 0;
-    for (const QString& l : m_lines)
-        n += l.contains(fragment) ? 1 : 0;
-    return n;
+    return int(std::count_if(m_lines.cbegin(), m_lines.cend(),
+                             [&](const QString& line) { return line.contains(fragment); }));
 }
 
 ScriptedAutomationListener::ScriptedAutomationListener(QStringList answers, QString fallback)
-    : m_answers(std::move(answers))
-    , m_fallback(std::move(fallback))
+    : m_answers(std::move(answers)), m_fallback(std::move(fallback)),
+      m_previous(Velmar::AutomationListenerManager::SetListener(this))
 {
-    m_previous = Velmar::AutomationListenerManager::SetListener(this);
 }
 
 ScriptedAutomationListener::~ScriptedAutomationListener()
@@ -67,9 +59,7 @@ QString ScriptedAutomationListener::AnswerDialog(const QString& title, const QSt
 }
 
 ModalActor::ModalActor(std::function<void(QWidget* modal)> act)
-    : m_act(std::move(act))
-    , m_context(new QObject)
-    , m_thread(new QThread)
+    : m_act(std::move(act)), m_context(new QObject), m_thread(new QThread)
 {
     // The clock ticks in its own thread and calls back through queued calls: the
     // application postpones GUI-thread timers while Carbon events are blocked (as they are

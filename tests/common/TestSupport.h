@@ -23,7 +23,7 @@ public:
     LogCapture& operator=(const LogCapture&) = delete;
 
     const QStringList& lines() const { return m_lines; }
-    bool contains(const QString& fragment) const;
+    bool contains(const QString& fragment) const { return count(fragment) > 0; }
     int count(const QString& fragment) const;
     void clear() { m_lines.clear(); }
 

@@ -128,19 +128,9 @@ private Q_SLOTS:
         QVERIFY2(err.contains(QStringLiteral("][FATAL]: dying now\n")), qPrintable(err));
     }
 
-    void categoryNames()
-    {
-        QCOMPARE(LogCategoryName(kLogUnknown), "Unknown");
-        QCOMPARE(LogCategoryName(kLogWindowManagement), "WindowManagement");
-        QCOMPARE(LogCategoryName(kLogNotImpl), "NotImpl");
-        QCOMPARE(LogCategoryName(kLogActivation), "Activation");
-        QCOMPARE(LogCategoryName(kLogEvents | kLogMenus), "N/A");
-        QCOMPARE(LogCategoryName(0x200), "N/A");
-        QCOMPARE(LogCategoryName(0), "N/A");
-    }
-
     void categoryGating()
     {
+        QCOMPARE(LogCategoryName(kLogEvents | kLogMenus), "N/A"); // one category at a time
         VelmarTest::LogCapture log;
         VelmarLog(kLogNotImpl, "PlotCIcon %d", 7);
         QVERIFY(log.lines().isEmpty());
@@ -156,16 +146,13 @@ private Q_SLOTS:
         VelmarLog(kLogNotImpl, "again");
         VelmarLog(kLogEvents, "never on");
         QCOMPARE(log.lines().size(), 1);
-    }
 
-    void logMessagesAreCutAt1023()
-    {
-        VelmarTest::LogCapture log;
+        // Messages are cut at 1023 characters.
         SetLogCategory(kLogEvents, true);
         const QByteArray big(5000, 'z');
         VelmarLog(kLogEvents, "%s", big.constData());
-        QCOMPARE(log.lines().size(), 1);
-        QCOMPARE(log.lines().at(0).count(u'z'), 1023);
+        QCOMPARE(log.lines().size(), 2);
+        QCOMPARE(log.lines().at(1).count(u'z'), 1023);
     }
 
     void debugStrLogsPascalText()
@@ -218,31 +205,22 @@ private Q_SLOTS:
         QCOMPARE(listener.count(), 4);
     }
 
-    void carbonEventsBlockedWhileAsking()
-    {
-        VelmarTest::ScriptedAutomationListener listener;
-        bool blockedDuringDialog = false;
-        listener.setResponder([&](const VelmarTest::ScriptedAutomationListener::Question&) {
-            blockedDuringDialog = Private::MainEventQueue()->CheckCarbonEventsDisabled();
-            return QStringLiteral("Ignore");
-        });
-        QVERIFY(!Private::MainEventQueue()->CheckCarbonEventsDisabled());
-        assertAt(70);
-        QVERIFY(blockedDuringDialog);
-        QVERIFY(!Private::MainEventQueue()->CheckCarbonEventsDisabled());
-    }
-
     void assertionsNeverNest()
     {
         VelmarTest::LogCapture log;
         VelmarTest::ScriptedAutomationListener listener;
         int inner = 0;
+        bool blockedDuringDialog = false;
         listener.setResponder([&](const VelmarTest::ScriptedAutomationListener::Question&) {
+            // Carbon events wait while the user is asked.
+            blockedDuringDialog = Private::MainEventQueue()->CheckCarbonEventsDisabled();
             if (inner++ == 0)
                 assertAt(99, "nested");
             return QStringLiteral("Ignore");
         });
         assertAt(98);
+        QVERIFY(blockedDuringDialog);
+        QVERIFY(!Private::MainEventQueue()->CheckCarbonEventsDisabled());
         QCOMPARE(listener.count(), 1);
         QCOMPARE(log.count(QStringLiteral(
                      "velmar_assert: another assert is displayed. Something bad happens")),
@@ -257,14 +235,13 @@ private Q_SLOTS:
     void realAssertBoxIgnoreAll()
     {
         QString title;
-        QStringList buttons;
+        int buttons = 0;
         {
             VelmarTest::ModalActor actor([&](QWidget* modal) {
                 auto* box = qobject_cast<QMessageBox*>(modal);
                 QVERIFY(box);
                 title = box->windowTitle();
-                for (QAbstractButton* b : box->buttons())
-                    buttons << b->text().remove(u'&');
+                buttons = int(box->buttons().size());
                 QCOMPARE(box->defaultButton(), box->button(QMessageBox::Ignore));
                 for (QAbstractButton* b : box->buttons()) {
                     if (b->text() == QStringLiteral("Ignore all"))
@@ -272,10 +249,10 @@ private Q_SLOTS:
                 }
             });
             assertAt(120);
+            QVERIFY(actor.acted());
         }
         QCOMPARE(title, QStringLiteral("Velmar assert"));
-        QVERIFY(buttons.contains(QStringLiteral("Ignore all")));
-        QCOMPARE(buttons.size(), 4);
+        QCOMPARE(buttons, 4);
 
         // Ignored for good: no box appears.
         VelmarTest::ModalActor actor([](QWidget*) {});

@@ -25,37 +25,22 @@ struct Exported {
 };
 
 // The exported functions, listed by hand so that a wrong table entry shows up.
+#define FLAG(function) Exported{&function, #function}
 const Exported kExported[] = {
-    {&UseNativeEventAvail, "UseNativeEventAvail"},
-    {&UseEventAvailInCheckForEvent, "UseEventAvailInCheckForEvent"},
-    {&EnableLooperFiltering, "EnableLooperFiltering"},
-    {&EnableDirectQtDrawing, "EnableDirectQtDrawing"},
-    {&SupportVelmarWindowOverlays, "SupportVelmarWindowOverlays"},
-    {&ReportPaintEventFrequency, "ReportPaintEventFrequency"},
-    {&MaximumStatUpdateRate, "MaximumStatUpdateRate"},
-    {&AlwaysProcessEventsInReceiveNextEvent, "AlwaysProcessEventsInReceiveNextEvent"},
-    {&DeferrredDeleteInProcessNonCarbonEvents, "DeferrredDeleteInProcessNonCarbonEvents"},
-    {&PendingEventsDelayIdleProcessing, "PendingEventsDelayIdleProcessing"},
-    {&MouseDownDelaysIdleProcessing, "MouseDownDelaysIdleProcessing"},
-    {&LimitPaintingViewerOnIdle, "LimitPaintingViewerOnIdle"},
-    {&LimitPaintingSmartToolOnIdle, "LimitPaintingSmartToolOnIdle"},
-    {&LimitPaintingAudioMetersOnIdle, "LimitPaintingAudioMetersOnIdle"},
-    {&LimitPaintingCaptureToolOnIdle, "LimitPaintingCaptureToolOnIdle"},
-    {&LimitDrawingWithWindowVisibleRegion, "LimitDrawingWithWindowVisibleRegion"},
-    {&MouseClickStopsPlayLikeIn55, "MouseClickStopsPlayLikeIn55"},
-    {&CheckForUserEventBehavesLikeIn55WithoutNullEvent,
-     "CheckForUserEventBehavesLikeIn55WithoutNullEvent"},
-    {&SupportLegacyMacEventProcessing, "SupportLegacyMacEventProcessing"},
-    {&DontCallMainEventLoopCallbacksFromWNE, "DontCallMainEventLoopCallbacksFromWNE"},
-    {&QWebSettingsPluginsEnabled, "QWebSettingsPluginsEnabled"},
-    {&TarnixPassthroughMode, "TarnixPassthroughMode"},
-    {&CCDontCallDisposePlayerCacheInSetEffectDirty,
-     "CCDontCallDisposePlayerCacheInSetEffectDirty"},
-    {&CCKeepLumo1VectorScopeEffectsLoaded, "CCKeepLumo1VectorScopeEffectsLoaded"},
-    {&CCOnlyUpdateCurrentMonitor, "CCOnlyUpdateCurrentMonitor"},
-    {&CCFastScrubCurrentMonitor, "CCFastScrubCurrentMonitor"},
-    {&TarnixHoldLastDelta, "TarnixHoldLastDelta"},
+    FLAG(UseNativeEventAvail), FLAG(UseEventAvailInCheckForEvent), FLAG(EnableLooperFiltering),
+    FLAG(EnableDirectQtDrawing), FLAG(SupportVelmarWindowOverlays), FLAG(ReportPaintEventFrequency),
+    FLAG(MaximumStatUpdateRate), FLAG(AlwaysProcessEventsInReceiveNextEvent),
+    FLAG(DeferrredDeleteInProcessNonCarbonEvents), FLAG(PendingEventsDelayIdleProcessing),
+    FLAG(MouseDownDelaysIdleProcessing), FLAG(LimitPaintingViewerOnIdle),
+    FLAG(LimitPaintingSmartToolOnIdle), FLAG(LimitPaintingAudioMetersOnIdle),
+    FLAG(LimitPaintingCaptureToolOnIdle), FLAG(LimitDrawingWithWindowVisibleRegion),
+    FLAG(MouseClickStopsPlayLikeIn55), FLAG(CheckForUserEventBehavesLikeIn55WithoutNullEvent),
+    FLAG(SupportLegacyMacEventProcessing), FLAG(DontCallMainEventLoopCallbacksFromWNE),
+    FLAG(QWebSettingsPluginsEnabled), FLAG(TarnixPassthroughMode),
+    FLAG(CCDontCallDisposePlayerCacheInSetEffectDirty), FLAG(CCKeepLumo1VectorScopeEffectsLoaded),
+    FLAG(CCOnlyUpdateCurrentMonitor), FLAG(CCFastScrubCurrentMonitor), FLAG(TarnixHoldLastDelta),
 };
+#undef FLAG
 
 // Defaults that are 0; every other flag defaults to 1.
 const QStringList kZeroDefaults{
@@ -103,42 +88,26 @@ private Q_SLOTS:
         QCOMPARE(MaximumStatUpdateRate(kFeatureFlagQuery), 30u);
     }
 
-    void otherVersionWipesStore_data()
-    {
-        QTest::addColumn<QVariant>("version");
-        QTest::newRow("18") << QVariant(18);
-        QTest::newRow("20") << QVariant(20);
-        QTest::newRow("missing") << QVariant();
-        QTest::newRow("text") << QVariant(QStringLiteral("nineteen"));
-    }
-
+    // A store written by another version (or by none) is wiped and refilled with defaults.
     void otherVersionWipesStore()
     {
-        QFETCH(QVariant, version);
-        {
+        for (const QVariant& version : {QVariant(18), QVariant(20), QVariant(), QVariant(QStringLiteral("nineteen"))}) {
+            init();
+            {
+                QSettings s = store();
+                if (version.isValid())
+                    s.setValue(QLatin1String(kPreferencesVersionKey), version);
+                s.setValue(QStringLiteral("UseNativeEventAvail"), 0);
+                s.setValue(QStringLiteral("EnableDirectQtDrawing"), 1);
+                s.setValue(QStringLiteral("SomeOldKey"), 5);
+            }
+            QCOMPARE(EnableLooperFiltering(kFeatureFlagQuery), 1u);
             QSettings s = store();
-            if (version.isValid())
-                s.setValue(QLatin1String(kPreferencesVersionKey), version);
-            s.setValue(QStringLiteral("UseNativeEventAvail"), 0);
-            s.setValue(QStringLiteral("EnableDirectQtDrawing"), 1);
-            s.setValue(QStringLiteral("SomeOldKey"), 5);
+            QVERIFY(!s.contains(QStringLiteral("SomeOldKey")));
+            QCOMPARE(s.value(QLatin1String(kPreferencesVersionKey)).toInt(), 19);
+            QCOMPARE(UseNativeEventAvail(kFeatureFlagQuery), 1u);
+            QCOMPARE(EnableDirectQtDrawing(kFeatureFlagQuery), 0u);
         }
-        QCOMPARE(EnableLooperFiltering(kFeatureFlagQuery), 1u);
-        QSettings s = store();
-        QVERIFY(!s.contains(QStringLiteral("SomeOldKey")));
-        QCOMPARE(s.value(QLatin1String(kPreferencesVersionKey)).toInt(), 19);
-        QCOMPARE(UseNativeEventAvail(kFeatureFlagQuery), 1u);
-        QCOMPARE(EnableDirectQtDrawing(kFeatureFlagQuery), 0u);
-    }
-
-    void currentVersionIsKept()
-    {
-        {
-            QSettings s = store();
-            s.setValue(QLatin1String(kPreferencesVersionKey), 19);
-            s.setValue(QStringLiteral("EnableDirectQtDrawing"), 1);
-        }
-        QCOMPARE(EnableDirectQtDrawing(kFeatureFlagQuery), 1u);
     }
 
     void setWritesThroughOnlyOnChange()

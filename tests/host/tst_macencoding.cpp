@@ -8,6 +8,7 @@
 #include <unicode/ucnv.h>
 
 #include <cstring>
+#include <tuple>
 #include <vector>
 
 using namespace Velmar;
@@ -137,25 +138,18 @@ private Q_SLOTS:
         QCOMPARE(MakeLocal8Bit(QString::fromUtf16(kHiragana)), QByteArray(kHiraganaSjis, 7));
     }
 
-    void cutsAtCharacterBoundary_data()
-    {
-        QTest::addColumn<int>("dstBytes");
-        QTest::addColumn<QByteArray>("expected");
-        QTest::newRow("room for 1 byte") << 2 << QByteArray();
-        QTest::newRow("room for 3 bytes") << 4 << QByteArray("\x82\xa0");
-        QTest::newRow("room for 5 bytes") << 6 << QByteArray("\x82\xa0\x82\xa2");
-        QTest::newRow("exact") << 7 << QByteArray(kHiraganaSjis);
-        QTest::newRow("terminator only") << 1 << QByteArray();
-    }
+    // Output is cut at a character boundary, never inside a two-byte character.
     void cutsAtCharacterBoundary()
     {
-        QFETCH(int, dstBytes);
-        QFETCH(QByteArray, expected);
         QVERIFY(SetCurrentMacEncoding("Shift_JIS"));
-        bool lossy = false;
-        const std::string out = fromUnicode(kHiragana, &lossy, dstBytes);
-        QCOMPARE(QByteArray::fromStdString(out), expected);
-        QCOMPARE(lossy, expected.size() < 6);
+        const std::pair<int, QByteArray> rows[] = {
+            {1, QByteArray()}, {2, QByteArray()}, {4, QByteArray("\x82\xa0")},
+            {6, QByteArray("\x82\xa0\x82\xa2")}, {7, QByteArray(kHiraganaSjis)}};
+        for (const auto& [dstBytes, expected] : rows) {
+            bool lossy = false;
+            QCOMPARE(QByteArray::fromStdString(fromUnicode(kHiragana, &lossy, dstBytes)), expected);
+            QCOMPARE(lossy, expected.size() < 6);
+        }
     }
 
     void unmappableCharacters()
@@ -203,39 +197,21 @@ private Q_SLOTS:
         QCOMPARE(QByteArray(bytes), QByteArray("abc"));
     }
 
-    void selectsMacEncodings_data()
+    void selectsAndRefusesEncodings()
     {
-        QTest::addColumn<QByteArray>("name");
-        QTest::addColumn<int>("byte");
-        QTest::addColumn<int>("unit");
-        QTest::newRow("cyrillic") << QByteArray("x-mac-cyrillic") << 0x80 << 0x0410;
-        QTest::newRow("greek") << QByteArray("x-mac-greek") << 0xA1 << 0x0393;
-    }
-    void selectsMacEncodings()
-    {
-        QFETCH(QByteArray, name);
-        QFETCH(int, byte);
-        QFETCH(int, unit);
-        QVERIFY(SetCurrentMacEncoding(name.constData()));
-        QCOMPARE(QByteArray(CurrentMacEncodingName()), name);
-        QCOMPARE(int(toUnicode(std::string(1, char(byte))).at(0)), unit);
-        QVERIFY(toUnicode(allNonNulBytes()) == icuToUnicode(name.constData(), allNonNulBytes()));
-    }
-
-    void refusesUnusableEncodings_data()
-    {
-        QTest::addColumn<QByteArray>("name");
-        QTest::newRow("unknown") << QByteArray("no-such-encoding");
-        QTest::newRow("utf-16") << QByteArray("UTF-16");
-        QTest::newRow("ebcdic") << QByteArray("ibm-037");
-    }
-    void refusesUnusableEncodings()
-    {
-        QFETCH(QByteArray, name);
-        QVERIFY(SetCurrentMacEncoding("x-mac-cyrillic"));
-        QVERIFY(!SetCurrentMacEncoding(name.constData()));
-        QCOMPARE(QByteArray(CurrentMacEncodingName()), QByteArray("x-mac-cyrillic"));
-        QCOMPARE(int(toUnicode("\x80").at(0)), 0x0410);
+        const std::tuple<const char*, int, int> usable[] = {{"x-mac-cyrillic", 0x80, 0x0410},
+                                                            {"x-mac-greek", 0xA1, 0x0393}};
+        for (const auto& [name, byte, unit] : usable) {
+            QVERIFY(SetCurrentMacEncoding(name));
+            QCOMPARE(QByteArray(CurrentMacEncodingName()), QByteArray(name));
+            QCOMPARE(int(toUnicode(std::string(1, char(byte))).at(0)), unit);
+            QVERIFY(toUnicode(allNonNulBytes()) == icuToUnicode(name, allNonNulBytes()));
+        }
+        // Unknown, not byte-based, or not ASCII-compatible: refused, the current one stays.
+        for (const char* name : {"no-such-encoding", "UTF-16", "ibm-037"}) {
+            QVERIFY(!SetCurrentMacEncoding(name));
+            QCOMPARE(QByteArray(CurrentMacEncodingName()), QByteArray("x-mac-greek"));
+        }
         QVERIFY(SetCurrentMacEncoding(""));
         QCOMPARE(QByteArray(CurrentMacEncodingName()), QByteArray("macintosh"));
     }
