@@ -2,6 +2,8 @@
 // extension (libXtst is loaded at run time when present; no build dependency).
 #include "TestSupport.h"
 
+#include <Velmar/Events.h>
+
 #include "platform/Platform.h"
 #include "platform/VirtualKeys.h"
 
@@ -45,17 +47,9 @@ struct XTest {
 #endif
     }
 
-    void key(unsigned long keysym, bool press)
-    {
-        fakeKey(display, keysymToKeycode(display, keysym), press ? 1 : 0, 0);
-        sync(display, 0);
-    }
-
-    void button(unsigned button, bool press)
-    {
-        fakeButton(display, button, press ? 1 : 0, 0);
-        sync(display, 0);
-    }
+    void key(unsigned long keysym, bool press) { fakeKey(display, keysymToKeycode(display, keysym), press, 0); sync(display, 0); }
+    void button(unsigned button, bool press) { fakeButton(display, button, press, 0); sync(display, 0); }
+    void tap(unsigned long keysym) { key(keysym, true); key(keysym, false); }
 };
 
 } // namespace
@@ -129,24 +123,20 @@ void X11InputTest::keys()
 void X11InputTest::capsLockToggles()
 {
     const bool before = Platform::isCapsLockToggled();
-    m_xtest.key(0xffe5, true);
-    m_xtest.key(0xffe5, false);
+    m_xtest.tap(0xffe5);
     QCOMPARE(Platform::isCapsLockToggled(), !before);
+    QCOMPARE((Velmar::GetCurrentKeyModifiers() & Velmar::alphaLock) != 0, !before);
     Velmar::UInt8 state[256];
     Platform::getKeyboardState(state);
     QCOMPARE(int(state[VK::Capital] & 0x01), before ? 0 : 1);
-    m_xtest.key(0xffe5, true);
-    m_xtest.key(0xffe5, false);
+    m_xtest.tap(0xffe5);
     QCOMPARE(Platform::isCapsLockToggled(), before);
 }
 
 // The keypad's 7 is Home with Num Lock off and VK_NUMPAD7 with it on, as on Windows.
 void X11InputTest::keypadFollowsNumLock()
 {
-    auto toggleNumLock = [this] {
-        m_xtest.key(0xff7f, true);
-        m_xtest.key(0xff7f, false);
-    };
+    auto toggleNumLock = [this] { m_xtest.tap(0xff7f); };
     Velmar::UInt8 state[256];
     Platform::getKeyboardState(state);
     const bool numLockWasOn = state[VK::NumLock] & 0x01;
