@@ -16,12 +16,9 @@ namespace {
 void fillArc(const char* caller, SInt16 verb, const Rect* r, short startAngle, short arcAngle,
              const PatPtr* pattern = nullptr)
 {
-    const QRect q = toQRect(r);
-    if (q.isEmpty())
-        return;
     const QtArc arc = toQtArc(startAngle, arcAngle);
-    fillShape(caller, verb, q, pattern,
-              [&](QPainter* p) { p->drawPie(q, arc.start, arc.span); });
+    fillShapeInRect(caller, verb, r, pattern,
+                    [&](QPainter* p, const QRect& q) { p->drawPie(q, arc.start, arc.span); });
 }
 
 } // namespace

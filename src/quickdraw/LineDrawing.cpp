@@ -3,7 +3,7 @@
 #include <Velmar/QDShapes.h>
 #include <Velmar/QuickDraw.h>
 
-#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 #include "quickdraw/ShapeRecording.h"
 
@@ -57,51 +57,31 @@ short wrap(int value)
 
 void MoveTo(short h, short v)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: MoveTo: cannot get current port");
-        return;
-    }
-    moveTo(port, h, v);
+    if (QtGrafPort* port = shapePort("warning: MoveTo: cannot get current port"))
+        moveTo(port, h, v);
 }
 
 void Move(short dh, short dv)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: Move: cannot get current port");
-        return;
-    }
-    moveTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
+    if (QtGrafPort* port = shapePort("warning: Move: cannot get current port"))
+        moveTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
 }
 
 void LineTo(short h, short v)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: LineTo: cannot get current port");
-        return;
-    }
-    lineTo(port, h, v);
+    if (QtGrafPort* port = shapePort("warning: LineTo: cannot get current port"))
+        lineTo(port, h, v);
 }
 
 void Line(short dh, short dv)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: Line: cannot get current port");
-        return;
-    }
-    lineTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
+    if (QtGrafPort* port = shapePort("warning: Line: cannot get current port"))
+        lineTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
 }
 
 void DrawLinesFromPointPairs(const QList<QPoint>& points)
 {
-    if (!currentGrafPort()) {
-        warnNoPort("warning: DrawLinesFromPointPairs: cannot get Qt port");
-        return;
-    }
-    if (points.size() < 2)
+    if (!shapePort("warning: DrawLinesFromPointPairs: cannot get Qt port") || points.size() < 2)
         return;
     const QRect bounds = QPolygon(points).boundingRect();
     strokeShape("DrawLinesFromPointPairs", bounds, [&points](QPainter* p) {
@@ -111,11 +91,7 @@ void DrawLinesFromPointPairs(const QList<QPoint>& points)
 
 void DrawPolylineFromPoints(const QList<QPoint>& points)
 {
-    if (!currentGrafPort()) {
-        warnNoPort("warning: DrawLinesFromPointPairs: cannot get Qt port");
-        return;
-    }
-    if (points.isEmpty())
+    if (!shapePort("warning: DrawLinesFromPointPairs: cannot get Qt port") || points.isEmpty())
         return;
     const QRect bounds = QPolygon(points).boundingRect();
     strokeShape("DrawPolylineFromPoints", bounds, [&points](QPainter* p) {

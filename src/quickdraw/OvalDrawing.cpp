@@ -3,7 +3,6 @@
 #include <Velmar/QuickDraw.h>
 
 #include "foundation/Conversions.h"
-#include "quickdraw/GrafPortPrivate.h"
 #include "quickdraw/ShapePainting.h"
 #include "quickdraw/ShapeRecording.h"
 
@@ -15,10 +14,8 @@ namespace {
 
 void fillOval(const char* caller, SInt16 verb, const Rect* r, const PatPtr* pattern = nullptr)
 {
-    const QRect q = toQRect(r);
-    if (q.isEmpty())
-        return;
-    fillShape(caller, verb, q, pattern, [&q](QPainter* p) { p->drawEllipse(q); });
+    fillShapeInRect(caller, verb, r, pattern,
+                    [](QPainter* p, const QRect& q) { p->drawEllipse(q); });
 }
 
 } // namespace
@@ -26,17 +23,10 @@ void fillOval(const char* caller, SInt16 verb, const Rect* r, const PatPtr* patt
 // Unlike FrameRect, the stroke is not inset for the pen width.
 void FrameOval(const Rect* r)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: FrameOval: cannot get current port");
-        return;
-    }
     const QRect q = toQRect(r);
-    if (port->definingRgn) {
-        recordFrameShape(port, QRegion(q, QRegion::Ellipse));
-        return;
-    }
-    if (q.isEmpty())
+    if (!framingPort("warning: FrameOval: cannot get current port",
+                     [&q] { return QRegion(q, QRegion::Ellipse); })
+        || q.isEmpty())
         return;
     strokeShape("FrameOval", q, [&q](QPainter* p) { p->drawEllipse(q); });
 }

@@ -40,11 +40,9 @@ void fillPoly(const char* caller, const char* warning, SInt16 verb, PolyPtr* pol
 
 void FramePoly(PolyPtr* poly)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: FramePoly: cannot get current port");
+    QtGrafPort* port = shapePort("warning: FramePoly: cannot get current port");
+    if (!port)
         return;
-    }
     if (port->definingRgn) {
         VELMAR_ASSERT(poly && poly->qPoly, "FramePoly needs a polygon");
         if (poly && poly->qPoly)

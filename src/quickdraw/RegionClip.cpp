@@ -16,45 +16,25 @@ using namespace Private;
 // The port's stored clip, in force or not; a fresh port's is the wide-open rectangle.
 void GetClip(RgnHandle rgn)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: GetClip: cannot get current port");
-        return;
-    }
-    if (!rgn) {
-        shapeWarning("warning: GetClip: null region");
-        return;
-    }
-    *rgn = port->clipRegion;
+    QtGrafPort* port = shapePort("warning: GetClip: cannot get current port");
+    if (port && given(rgn, "warning: GetClip: null region"))
+        *rgn = port->clipRegion;
 }
 
 void SetClip(RgnHandle rgn)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: SetClip: cannot get current port");
-        return;
-    }
-    if (!rgn) {
-        shapeWarning("warning: SetClip: null region");
-        return;
-    }
-    SetPortClipRegion(port, rgn);
+    QtGrafPort* port = shapePort("warning: SetClip: cannot get current port");
+    if (port && given(rgn, "warning: SetClip: null region"))
+        SetPortClipRegion(port, rgn);
 }
 
 void ClipRect(const Rect* r)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: ClipRect: cannot get current port");
-        return;
+    QtGrafPort* port = shapePort("warning: ClipRect: cannot get current port");
+    if (port && given(r, "warning: ClipRect: null rectangle")) {
+        QRegion region(toQRect(r));
+        SetPortClipRegion(port, &region);
     }
-    if (!r) {
-        shapeWarning("warning: ClipRect: null rectangle");
-        return;
-    }
-    QRegion region(toQRect(r));
-    SetPortClipRegion(port, &region);
 }
 
 // Recomputed at every call so that screens coming and going are seen.

@@ -35,14 +35,8 @@ void FillRgn(RgnHandle rgn, const PatPtr& pattern)
 // The frame is the region minus the region inset by the pen width both ways, painted.
 void FrameRgn(RgnHandle rgn)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: FrameRgn: cannot get current port");
-        return;
-    }
-    if (!rgn)
-        return;
-    if (recordFrameShape(port, *rgn))
+    QtGrafPort* port = shapePort("warning: FrameRgn: cannot get current port");
+    if (!port || !rgn || recordFrameShape(port, *rgn))
         return;
     const int w = penPixelWidth(port->currentPen());
     if (w == 0 || rgn->isEmpty())

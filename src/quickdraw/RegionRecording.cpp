@@ -4,7 +4,7 @@
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
 
-#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapeRecording.h"
 
 #include <QPolygon>
@@ -15,11 +15,9 @@ using namespace Private;
 
 void OpenRgn()
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: OpenRgn: cannot get current port");
+    QtGrafPort* port = shapePort("warning: OpenRgn: cannot get current port");
+    if (!port)
         return;
-    }
     VELMAR_ASSERT(port->definingPoly == false, "OpenRgn while a polygon is open");
     VELMAR_ASSERT(port->definingRgn == false, "OpenRgn while a region is being defined");
     VELMAR_ASSERT(port->rgnSave == NULL, "OpenRgn while a region is recorded");
@@ -36,11 +34,9 @@ void CloseRgn(RgnHandle dst)
 {
     if (!dst)
         return;
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: CloseRgn: cannot get current port");
+    QtGrafPort* port = shapePort("warning: CloseRgn: cannot get current port");
+    if (!port)
         return;
-    }
     VELMAR_ASSERT(port->definingRgn == true, "CloseRgn without OpenRgn");
     VELMAR_ASSERT(port->definingPoly == false, "CloseRgn while a polygon is open");
     VELMAR_ASSERT(port->rgnSave, "CloseRgn without a recorded region");

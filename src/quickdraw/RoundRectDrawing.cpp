@@ -4,7 +4,7 @@
 #include <Velmar/QuickDraw.h>
 
 #include "foundation/Conversions.h"
-#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 
 namespace Velmar {
@@ -22,23 +22,17 @@ void drawRounded(QPainter* p, const QRect& q, short ovalWidth, short ovalHeight)
 void fillRounded(const char* caller, SInt16 verb, const Rect* r, short ovalWidth,
                  short ovalHeight, const PatPtr* pattern = nullptr)
 {
-    const QRect q = toQRect(r);
-    if (q.isEmpty())
-        return;
-    fillShape(caller, verb, q, pattern,
-              [&](QPainter* p) { drawRounded(p, q, ovalWidth, ovalHeight); });
+    fillShapeInRect(caller, verb, r, pattern, [&](QPainter* p, const QRect& q) {
+        drawRounded(p, q, ovalWidth, ovalHeight);
+    });
 }
 
 } // namespace
 
 void FrameRoundRect(const Rect* r, short ovalWidth, short ovalHeight)
 {
-    if (!currentGrafPort()) {
-        warnNoPort("warning: FrameRoundRect: cannot get current port");
-        return;
-    }
     const QRect q = toQRect(r);
-    if (q.isEmpty())
+    if (!shapePort("warning: FrameRoundRect: cannot get current port") || q.isEmpty())
         return;
     strokeShape("FrameRoundRect", q,
                 [&](QPainter* p) { drawRounded(p, q, ovalWidth, ovalHeight); });

@@ -6,9 +6,34 @@
 #include "quickdraw/PortPainter.h"
 #include "quickdraw/ShapeLog.h"
 
-#include <QPainterPath>
+#include <span>
 
 namespace Velmar::Private {
+
+namespace {
+
+// Fills non-overlapping rectangles with a verb's ink (no pen needed); marks `dirty`.
+void fillRects(const char* caller, SInt16 verb, std::span<const QRect> rects, const QRect& dirty,
+               const PatPtr* pattern)
+{
+    MakeQPainter painter(caller);
+    if (!painter || rects.empty())
+        return;
+    QBrush brush;
+    QPainter::CompositionMode mode;
+    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
+        return;
+    const QPainter::CompositionMode own = painter->compositionMode();
+    if (mode != own)
+        painter->setCompositionMode(mode);
+    for (const QRect& r : rects)
+        painter->fillRect(r, brush);
+    if (mode != own)
+        painter->setCompositionMode(own);
+    painter |= dirty;
+}
+
+} // namespace
 
 bool verbInk(const char* caller, QtGrafPort* port, SInt16 verb, const PatPtr* pattern,
              QBrush* brush, QPainter::CompositionMode* mode)
@@ -38,48 +63,16 @@ bool verbInk(const char* caller, QtGrafPort* port, SInt16 verb, const PatPtr* pa
     }
 }
 
-void fillShapePath(const char* caller, SInt16 verb, const QPainterPath& path, const QRect& dirty,
-                   const PatPtr* pattern)
-{
-    fillShape(caller, verb, dirty, pattern, [&path](QPainter* p) { p->drawPath(path); });
-}
-
 void fillShapeRect(const char* caller, SInt16 verb, const QRect& rect, const PatPtr* pattern)
 {
-    MakeQPainter painter(caller);
-    if (!painter || rect.isEmpty())
-        return;
-    QBrush brush;
-    QPainter::CompositionMode mode;
-    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
-        return;
-    const QPainter::CompositionMode own = painter->compositionMode();
-    if (mode != own)
-        painter->setCompositionMode(mode);
-    painter->fillRect(rect, brush);
-    if (mode != own)
-        painter->setCompositionMode(own);
-    painter |= rect;
+    fillRects(caller, verb, std::span(&rect, rect.isEmpty() ? 0 : 1), rect, pattern);
 }
 
 void fillShapeRegion(const char* caller, SInt16 verb, const QRegion& region,
                      const PatPtr* pattern)
 {
-    MakeQPainter painter(caller);
-    if (!painter || region.isEmpty())
-        return;
-    QBrush brush;
-    QPainter::CompositionMode mode;
-    if (!verbInk(caller, painter.port(), verb, pattern, &brush, &mode))
-        return;
-    const QPainter::CompositionMode own = painter->compositionMode();
-    if (mode != own)
-        painter->setCompositionMode(mode);
-    for (const QRect& r : region)
-        painter->fillRect(r, brush);
-    if (mode != own)
-        painter->setCompositionMode(own);
-    painter |= region.boundingRect();
+    fillRects(caller, verb, std::span(region.begin(), region.end()), region.boundingRect(),
+              pattern);
 }
 
 int penPixelWidth(const QPen& pen)

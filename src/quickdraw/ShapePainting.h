@@ -5,9 +5,9 @@
 #include <Velmar/QDTypes.h>
 #include <Velmar/QtGrafPort.h>
 
-#include <QPainter>
+#include "foundation/Conversions.h"
 
-class QPainterPath;
+#include <QPainter>
 
 namespace Velmar::Private {
 
@@ -89,10 +89,18 @@ void fillShape(const char* caller, SInt16 verb, const QRect& dirty, const PatPtr
     painter |= dirty;
 }
 
-// Fills `path` (local coordinates) with a verb's ink and no pen on the current port, under
-// the caller's name; marks `dirty`.
-void fillShapePath(const char* caller, SInt16 verb, const QPainterPath& path, const QRect& dirty,
-                   const PatPtr* pattern = nullptr);
+// Draws the shape `draw(QPainter*, const QRect&)` makes of the Toolbox rectangle `r` with a
+// verb's ink, as the oval, arc and rounded-rectangle calls do; nothing for a null or empty
+// rectangle. Marks the rectangle dirty.
+template <typename Draw>
+void fillShapeInRect(const char* caller, SInt16 verb, const Rect* r, const PatPtr* pattern,
+                     Draw draw)
+{
+    const QRect q = toQRect(r);
+    if (q.isEmpty())
+        return;
+    fillShape(caller, verb, q, pattern, [&](QPainter* p) { draw(p, q); });
+}
 
 // Fills a rectangle (inclusive corners) with a verb's ink; marks it dirty.
 void fillShapeRect(const char* caller, SInt16 verb, const QRect& rect,

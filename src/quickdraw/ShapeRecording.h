@@ -4,11 +4,26 @@
 
 #include <Velmar/QtGrafPort.h>
 
+#include "quickdraw/ShapeLog.h"
+
 namespace Velmar::Private {
 
 // While the port defines a region: XORs `shape` into the region being defined and returns
 // true (the caller then draws nothing). Otherwise returns false.
 bool recordFrameShape(QtGrafPort* port, const QRegion& shape);
+
+// The current port to draw a frame on. Null when there is none (after writing `warning`) and
+// when the port defines a region: `shape()` is then XORed into the region instead of drawn.
+template <typename Shape>
+QtGrafPort* framingPort(const char* warning, Shape shape)
+{
+    QtGrafPort* port = shapePort(warning);
+    if (port && port->definingRgn) {
+        recordFrameShape(port, shape());
+        return nullptr;
+    }
+    return port;
+}
 
 // While the port defines a polygon or a region: appends (h, v) to the open polygon.
 // Returns true when the port is recording.

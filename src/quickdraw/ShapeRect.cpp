@@ -4,7 +4,6 @@
 #include <Velmar/QuickDraw.h>
 
 #include "foundation/Conversions.h"
-#include "quickdraw/GrafPortPrivate.h"
 #include "quickdraw/RegionOps.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
@@ -29,17 +28,12 @@ bool isNormalPenPattern(const QBrush& brush)
 // right and down).
 void FrameRect(const Rect* r)
 {
-    QtGrafPort* port = currentGrafPort();
-    if (!port) {
-        warnNoPort("warning: FrameRect: cannot get current port");
-        return;
-    }
     const QRect q = toQRect(r);
     // The region is built only while recording, so that drawing a frame allocates nothing.
-    if (port->definingRgn) {
-        recordFrameShape(port, QRegion(q));
+    QtGrafPort* port =
+        framingPort("warning: FrameRect: cannot get current port", [&q] { return QRegion(q); });
+    if (!port)
         return;
-    }
     MakeQPainter painter(port, "FrameRect");
     if (!painter || q.isEmpty())
         return;
@@ -105,10 +99,8 @@ void StdRect(SInt16 verb, const Rect* r)
 {
     using Draw = void (*)(const Rect*);
     static constexpr Draw kByVerb[] = {FrameRect, PaintRect, EraseRect, InvertRect, PaintRect};
-    if (!currentGrafPort()) {
-        warnNoPort("warning: StdRect: cannot get current port");
+    if (!shapePort("warning: StdRect: cannot get current port"))
         return;
-    }
     if (verb < 0 || verb >= SInt16(std::size(kByVerb))) {
         shapeWarning("warning: StdRect: unknown verb");
         return;

@@ -117,10 +117,14 @@ private Q_SLOTS:
         QVERIFY(log.contains("PaintPoly"));
     }
 
-    void nestedOpenPolyAssertsAndReopens()
+    // A nested OpenPoly asserts and reopens; closing without opening is logged; killing the
+    // open polygon stops the recording, so that later lines draw instead of writing into freed
+    // memory; without a port OpenPoly asserts and gives a polygon that records nothing.
+    void misuse()
     {
         World world;
         VelmarTest::ScriptedAutomationListener listener({}, QStringLiteral("Ignore"));
+        VelmarTest::LogCapture log;
         PolyPtr* first = OpenPoly();
         LineTo(1, 1);
         PolyPtr* second = OpenPoly();
@@ -130,18 +134,11 @@ private Q_SLOTS:
         QCOMPARE(first->qPoly->size(), 1);
         QCOMPARE(second->qPoly->size(), 1);
         QVERIFY(!world.port()->definingPoly);
+        ClosePoly();
+        QVERIFY(log.contains("warning: ClosePoly: no polygon is open"));
         KillPoly(first);
         KillPoly(second);
-    }
 
-    // Closing without opening is logged; killing the open polygon stops the recording, so
-    // that later lines draw instead of writing into freed memory.
-    void closeWithoutOpenAndKillWhileOpen()
-    {
-        World world;
-        VelmarTest::LogCapture log;
-        ClosePoly();
-        QVERIFY(log.contains("ClosePoly"));
         PolyPtr* poly = OpenPoly();
         LineTo(5, 5);
         KillPoly(poly);
@@ -150,22 +147,15 @@ private Q_SLOTS:
         MoveTo(0, 0);
         LineTo(9, 0);
         QCOMPARE(world.touched().size(), 10);
-    }
 
-    void withoutPort()
-    {
-        GrafPtr saved = nullptr;
-        GetPort(&saved);
         SetPort(nullptr);
-        VelmarTest::LogCapture log;
         ClosePoly();
         QVERIFY(log.contains("warning: ClosePoly: cannot get current port"));
-        VelmarTest::ScriptedAutomationListener listener({}, QStringLiteral("Ignore"));
-        PolyPtr* poly = OpenPoly(); // a polygon that records nothing
+        poly = OpenPoly();
         QVERIFY(assertedWith(listener, "!!port"));
         QVERIFY(poly && poly->qPoly && poly->qPoly->isEmpty());
         KillPoly(poly);
-        SetPort(saved);
+        SetPort(world.port());
     }
 };
 
