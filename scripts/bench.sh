@@ -12,7 +12,7 @@ cmake --build "$build"
 out="$(mktemp -d)"
 run() {
   for exe in "$build"/bench/bench_*; do
-    [ -x "$exe" ] || continue
+    [ -f "$exe" ] && [ -x "$exe" ] || continue
     "$exe" --benchmark_format=json --benchmark_out="$out/$(basename "$exe").json" \
       --benchmark_out_format=json "$@" >/dev/null
   done
