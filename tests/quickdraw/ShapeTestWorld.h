@@ -95,14 +95,14 @@ inline QSet<QPoint> framePixels(int left, int top, int right, int bottom, int w)
     return rectPixels(left, top, right, bottom) - rectPixels(left + w, top + w, right - w, bottom - w);
 }
 
+// "count@x,y wxh" of a pixel set, for failure messages.
 inline QByteArray describe(const QSet<QPoint>& pixels)
 {
     QRect box;
     for (const QPoint& p : pixels)
         box |= QRect(p, QSize(1, 1));
-    return QByteArray::number(pixels.size()) + " pixels in " + QByteArray::number(box.x()) + ","
-        + QByteArray::number(box.y()) + " " + QByteArray::number(box.width()) + "x"
-        + QByteArray::number(box.height());
+    return QStringLiteral("%1@%2,%3 %4x%5").arg(pixels.size()).arg(box.x()).arg(box.y())
+        .arg(box.width()).arg(box.height()).toLatin1();
 }
 
 struct RgnDeleter {
