@@ -40,19 +40,6 @@ private Q_SLOTS:
         }
     }
 
-    // Shapes are given in local coordinates; the origin moves them on the image.
-    void drawingFollowsTheOrigin()
-    {
-        World world;
-        SetOrigin(-20, 30); // local (-20, 30) is the image's (0, 0)
-        const Rect r = R(40, -10, 50, 0);
-        FrameRect(&r);
-        QCOMPARE(world.touched(), framePixels(10, 10, 20, 20, 1));
-        MoveTo(-20, 80);
-        LineTo(-20, 80);
-        QVERIFY(world.touched().contains(QPoint(0, 50)));
-    }
-
     void frameRectWithPatternFramesTheRegion()
     {
         World world;
