@@ -8,8 +8,8 @@ bool EventHandler::handles(UInt32 eventClass, UInt32 eventKind) const
 {
     if (types.isEmpty())
         return true;
-    return std::any_of(types.cbegin(), types.cend(), [&](const EventTypeSpec& spec) {
-        return spec.eventClass == eventClass && spec.eventKind == eventKind;
+    return std::any_of(types.cbegin(), types.cend(), [&](const EventTypeSpec& t) {
+        return t.eventClass == eventClass && t.eventKind == eventKind;
     });
 }
 

@@ -27,23 +27,11 @@ RGBColor::RGBColor(unsigned int argb)
     set(argb);
 }
 
-// channelF() * 65535 truncated, as the Toolbox helpers always did. Qt 6 hands out channelF()
-// in single precision, which would lose one step on half of the 16-bit values, so ordinary
-// colours take their exact 16-bit channels; only extended-range colours go through floats.
-static unsigned short channelFromFloat(float f)
-{
-    const double v = static_cast<double>(f) * 65535.0;
-    return v <= 0.0 ? 0 : v >= 65535.0 ? 65535 : static_cast<unsigned short>(v);
-}
-
+// The Toolbox helpers took channelF() * 65535, truncated. Qt 6 hands out channelF() in
+// single precision, which would lose one step on half of the 16-bit values, so colours
+// give their exact 16-bit channels instead (extended-range ones clamped by toRgb()).
 void RGBColor::set(const QColor& c)
 {
-    if (c.spec() == QColor::ExtendedRgb) {
-        red = channelFromFloat(c.redF());
-        green = channelFromFloat(c.greenF());
-        blue = channelFromFloat(c.blueF());
-        return;
-    }
     if (!c.isValid()) {
         red = green = blue = 0;
         return;
