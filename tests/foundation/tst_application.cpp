@@ -20,6 +20,7 @@
 #include <QStyle>
 #include <QTabletEvent>
 
+#include <algorithm>
 #include <functional>
 #include <stdexcept>
 
@@ -31,10 +32,9 @@ namespace {
 
 int queuedCount(UInt32 eventClass, UInt32 eventKind)
 {
-    int n = 0;
-    for (const auto& item : MainEventQueue()->items())
-        n += item->isClass(eventClass, eventKind) ? 1 : 0;
-    return n;
+    const auto& items = MainEventQueue()->items();
+    return int(std::count_if(items.begin(), items.end(),
+                             [&](const auto& item) { return item->isClass(eventClass, eventKind); }));
 }
 
 const EventQueueItem* lastQueued()
@@ -77,18 +77,8 @@ QList<QMenu*> gRefreshed;
 
 int gHookCalls = 0;
 void* gHookMessage = nullptr;
-bool consumingHook(void* message, SInt32* result)
-{
-    ++gHookCalls;
-    gHookMessage = message;
-    *result = 42;
-    return true;
-}
-bool passingHook(void*, SInt32*)
-{
-    ++gHookCalls;
-    return false;
-}
+bool consumingHook(void* message, SInt32* result) { ++gHookCalls; gHookMessage = message; *result = 42; return true; }
+bool passingHook(void*, SInt32*) { ++gHookCalls; return false; }
 
 } // namespace
 

@@ -101,6 +101,14 @@ private Q_SLOTS:
             QStringLiteral("^\\[ *\\d+\\.\\d{3}\\]\\[WARNING\\]: handler 42\\n$"));
         QVERIFY2(warning.match(log.lines().at(0)).hasMatch(), qPrintable(log.lines().at(0)));
         QVERIFY(log.lines().at(1).contains(QStringLiteral("][UNKNOWN]: informative")));
+
+        // DebugStr logs a Pascal string's text, and nothing for null.
+        const unsigned char text[] = "\x05hello world";
+        DebugStr(text);
+        DebugStr(nullptr);
+        QCOMPARE(log.lines().size(), 4);
+        QVERIFY(log.lines().at(2).endsWith(QStringLiteral("[DEBUG]: hello\n")));
+        QVERIFY(log.lines().at(3).endsWith(QStringLiteral("[DEBUG]: \n")));
     }
 
     // Run by fatalMessageAborts in a child process only.
@@ -153,17 +161,6 @@ private Q_SLOTS:
         VelmarLog(kLogEvents, "%s", big.constData());
         QCOMPARE(log.lines().size(), 2);
         QCOMPARE(log.lines().at(1).count(u'z'), 1023);
-    }
-
-    void debugStrLogsPascalText()
-    {
-        VelmarTest::LogCapture log;
-        const unsigned char text[] = "\x05hello world";
-        DebugStr(text);
-        DebugStr(nullptr);
-        QCOMPARE(log.lines().size(), 2);
-        QVERIFY(log.lines().at(0).endsWith(QStringLiteral("[DEBUG]: hello\n")));
-        QVERIFY(log.lines().at(1).endsWith(QStringLiteral("[DEBUG]: \n")));
     }
 
     void assertionTextAndQuestion()
