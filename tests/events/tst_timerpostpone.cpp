@@ -20,9 +20,16 @@ using Private::MainTimerRegistry;
 
 namespace {
 
+// What happened, in order; a run of the same entry shows once.
 QStringList gSeen;
 
-// Logs its timer events; consecutive ones show once, with their number kept apart.
+void note(const QString& entry)
+{
+    if (gSeen.isEmpty() || gSeen.last() != entry)
+        gSeen << entry;
+}
+
+// Logs its timer events and counts them.
 class Probe : public QObject {
 public:
     explicit Probe(QString name) : m_name(std::move(name)) {}
@@ -32,8 +39,7 @@ protected:
     void timerEvent(QTimerEvent*) override
     {
         ++received;
-        if (gSeen.isEmpty() || gSeen.last() != m_name)
-            gSeen << m_name;
+        note(m_name);
     }
 
 private:
@@ -46,16 +52,10 @@ OSStatus takingHandler(EventHandlerCallRef, EventRef, void*)
     return noErr;
 }
 
-void spin(int passes = 20)
+void spin()
 {
-    for (int i = 0; i < passes; ++i)
+    for (int i = 0; i < 20; ++i)
         QCoreApplication::processEvents(QEventLoop::AllEvents);
-}
-
-void timerProc(EventLoopTimerRef, void*)
-{
-    if (gSeen.isEmpty() || gSeen.last() != QStringLiteral("carbon"))
-        gSeen << QStringLiteral("carbon");
 }
 
 } // namespace
@@ -130,7 +130,7 @@ private Q_SLOTS:
     void eventLoopTimersUnderTheApplication()
     {
         EventLoopTimerRef timer = nullptr;
-        InstallEventLoopTimer(GetMainEventLoop(), 0, 0, timerProc, nullptr, &timer);
+        InstallEventLoopTimer(GetMainEventLoop(), 0, 0, [](EventLoopTimerRef, void*) { note("carbon"); }, nullptr, &timer);
         QTRY_VERIFY(!gSeen.isEmpty());
         {
             ScopedCarbonEventsBlocker blocker("timers");
