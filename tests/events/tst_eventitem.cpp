@@ -251,15 +251,12 @@ private Q_SLOTS:
                                      "assert: kEventParameterList[idx].size == inSize", "0", "010203040506", "-50"}));
     }
 
-    // Deliberate oddities: a mouse down counts as a wheel event, a mouse move is no mouse event.
-    void predicateOddities()
+    // Deliberate oddities: a mouse down counts as a wheel event, a mouse move is no mouse
+    // event. And the exact debugging text of a class and kind.
+    void predicateOdditiesAndDebuggingText()
     {
         QVERIFY(makeItem(kEventClassMouse, kEventMouseDown)->isMouseWheelEvent());
         QVERIFY(!makeItem(kEventClassMouse, kEventMouseMoved)->isMouseEvent());
-    }
-
-    void debuggingString()
-    {
         QCOMPARE(EventQueueItem::EventClassAndKindToString(kEventClassMouse, kEventMouseDown),
                  QStringLiteral(", class=mous [1836021107], kind=.... [       1]"));
     }
@@ -272,7 +269,6 @@ private Q_SLOTS:
 
         const char* all = "mous/1 mous/2 keyb/1 keyb/3 keyb/2 wind/1 wind/5 wind/6 appl/1 appl/2";
         QTest::newRow("everyEvent") << int(everyEvent) << 0 << "";
-        QTest::newRow("zero") << 0 << 0 << "";
         QTest::newRow("activate: two kinds") << int(activMask) << 2 << "wind/5 wind/6";
         QTest::newRow("table order") << int(osMask | keyUpMask | mDownMask) << 4 << "mous/1 keyb/3 appl/1 appl/2";
         QTest::newRow("unknown bits ignored beside a known one") << int(0x0001 | 0x0080 | mUpMask) << 1 << "mous/2";
@@ -296,22 +292,6 @@ private Q_SLOTS:
         QCOMPARE(parts.join(u' '), pairs);
         QCOMPARE(capture.count(QStringLiteral("Unable to parse eventMask at all.... Returning negative")),
                  result < 0 ? 1 : 0);
-    }
-
-    void matching()
-    {
-        Private::EventTypeList list, empty;
-        Private::ParseEventMask(activMask, list);
-        EventQueueItemSmartPtr update = makeItem(kEventClassWindow, kEventWindowUpdate);
-        QVERIFY(Private::MatchesEventTypes(list, makeItem(kEventClassWindow, kEventWindowActivated).get()));
-        QVERIFY(!Private::MatchesEventTypes(list, update.get()));
-        QVERIFY(!Private::MatchesEventTypes(list, nullptr));
-        // an empty list matches everything, a null list with a count too
-        QVERIFY(Private::MatchesEventTypes(empty, update.get()));
-        QVERIFY(Private::MatchesEventTypes(nullptr, 3, kEventClassMouse, 1));
-        const EventTypeSpec one[] = {{kEventClassMouse, kEventMouseDown}};
-        QVERIFY(Private::MatchesEventTypes(one, 1, kEventClassMouse, kEventMouseDown));
-        QVERIFY(!Private::MatchesEventTypes(one, 1, kEventClassMouse, kEventMouseUp));
     }
 
     void toEventRecord_data()
@@ -396,6 +376,8 @@ private Q_SLOTS:
         EventRecord r{};
         QVERIFY(!ConvertEventRefToEventRecord(nullptr, &r));
         QVERIFY(!ConvertEventRefToEventRecord(makeItem(kEventClassMouse, kEventMouseDown).get(), nullptr));
+        Private::EventTypeList list;
+        QVERIFY(!Private::MatchesEventTypes(list, nullptr));
     }
 };
 
