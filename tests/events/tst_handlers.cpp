@@ -271,11 +271,11 @@ private Q_SLOTS:
     void invalidArguments()
     {
         EventHandlerRef ref = reinterpret_cast<EventHandlerRef>(0x1);
-        const EventTypeSpec spec{kEventClassMouse, kEventMouseDown};
+        const EventTypeSpec mouseDown{kEventClassMouse, kEventMouseDown};
         const EventTargetRef app = GetApplicationEventTarget();
         QCOMPARE(InstallEventHandler(app, nullptr, 0, nullptr, nullptr, &ref), OSStatus(paramErr));
         QVERIFY(ref == nullptr);
-        QCOMPARE(InstallEventHandler(GetWindowEventTarget(nullptr), recordingHandler, 1, &spec, nullptr, nullptr),
+        QCOMPARE(InstallEventHandler(GetWindowEventTarget(nullptr), recordingHandler, 1, &mouseDown, nullptr, nullptr),
                  OSStatus(paramErr));
         QCOMPARE(InstallEventHandler(EventTargetRef{}, recordingHandler, 0, nullptr, nullptr, nullptr),
                  OSStatus(paramErr));
