@@ -1,8 +1,8 @@
 // The pen: size, visibility, mode and the pen state record.
-#include "PortTestSupport.h"
+#include "QuickDrawTestSupport.h"
 
 using namespace Velmar;
-using VelmarTest::World;
+using namespace QDTest;
 
 class TestPen : public QObject {
     Q_OBJECT
@@ -70,18 +70,13 @@ private Q_SLOTS:
         QTest::addColumn<int>("composition");
         const int over = QPainter::CompositionMode_SourceOver;
         const int notXor = QPainter::RasterOp_NotSourceXorDestination;
-        QTest::newRow("srcCopy") << int(srcCopy) << over;
-        QTest::newRow("srcOr") << int(srcOr) << over;
-        QTest::newRow("srcXor") << int(srcXor) << notXor;
-        QTest::newRow("3") << 3 << over;
-        QTest::newRow("patCopy") << int(patCopy) << over;
-        QTest::newRow("patOr") << int(patOr) << over;
-        QTest::newRow("patXor") << int(patXor) << notXor;
-        QTest::newRow("patBic") << int(patBic) << int(QPainter::CompositionMode_DestinationOver);
-        QTest::newRow("notPatCopy") << int(notPatCopy) << over;
-        QTest::newRow("subPin") << int(subPin) << int(QPainter::CompositionMode_Exclusion);
-        QTest::newRow("-1") << -1 << over;
-        QTest::newRow("1000") << 1000 << over;
+        for (const auto& [name, mode, composition] :
+             {std::tuple{"srcCopy", int(srcCopy), over}, {"srcOr", srcOr, over}, {"srcXor", srcXor, notXor},
+              {"3", 3, over}, {"patCopy", patCopy, over}, {"patOr", patOr, over}, {"patXor", patXor, notXor},
+              {"patBic", patBic, int(QPainter::CompositionMode_DestinationOver)},
+              {"notPatCopy", notPatCopy, over}, {"subPin", subPin, int(QPainter::CompositionMode_Exclusion)},
+              {"-1", -1, over}, {"1000", 1000, over}})
+            QTest::newRow(name) << mode << composition;
     }
     void penModes()
     {
@@ -110,21 +105,6 @@ private Q_SLOTS:
         QCOMPARE(pen.v, SInt16(4));
         QCOMPARE(world->currentPen().width(), 5);
         QCOMPARE(world->currentCompositionMode(), QPainter::RasterOp_NotSourceXorDestination);
-        PenNormal();
-        PenState saved;
-        SetPenState(&state);
-        GetPenState(&saved);
-        QCOMPARE(saved.penLocation(), QPoint(3, 4));
-        QCOMPARE(saved.penSize(), 5);
-        QCOMPARE(saved.penMode(), SInt16(patXor));
-        QCOMPARE(saved.penPattern(), gray);
-        // Copies are independent.
-        PenState copy(saved);
-        copy.setPenLocation(QPoint(9, 9));
-        copy.setPenSize(1);
-        QCOMPARE(saved.penLocation(), QPoint(3, 4));
-        saved = copy;
-        QCOMPARE(saved.penSize(), 1);
         SetPenState(nullptr);
         GetPenState(nullptr);
         GetPen(nullptr);

@@ -1,11 +1,10 @@
 // Polygons: recording with OpenPoly/ClosePoly, drawing under the odd-even rule, and misuse
 // (nested opens, closing without opening, killing an open polygon, too few points).
-#include "ShapeTestWorld.h"
+#include "QuickDrawTestSupport.h"
 
-#include <Velmar/Diagnostics.h>
 
 using namespace Velmar;
-using namespace ShapeTest;
+using namespace QDTest;
 
 class TestPolygons : public QObject {
     Q_OBJECT

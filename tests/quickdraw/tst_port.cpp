@@ -1,13 +1,13 @@
 // The current port, the painter cap, dirty marking, port state, the no-port warnings,
 // pixels and scrolling.
-#include "PortTestSupport.h"
+#include "QuickDrawTestSupport.h"
 
 #include <memory>
 #include <vector>
 
 using namespace Velmar;
 using Velmar::Private::makeRect;
-using VelmarTest::World;
+using namespace QDTest;
 
 namespace {
 
@@ -39,38 +39,16 @@ struct NoPortCase {
     const char* warning;
     void (*call)();
 };
-const NoPortCase kNoPortCases[] = {
-    {"warning: FrameRect: Can't get current port!",
-     [] { QVERIFY(!Private::portPainter(nullptr, "FrameRect")); }},
+const NoPortCase kNoPortCases[] = { // one call per source file
     {"warning: PaintOval: Can't get current port!", [] { QVERIFY(!MakeQPainter("PaintOval")); }},
-    {"warning: GetBackColor: Can't get current port !",
-     [] { RGBColor c(7, 7, 7); GetBackColor(&c); QCOMPARE(c.red, (unsigned short)7); }},
     {"warning: GetForeColor: Can't get current port!",
      [] { RGBColor c(7, 7, 7); GetForeColor(&c); QCOMPARE(c.red, (unsigned short)7); }},
-    {"warning: RGBBackColor: Can't get current port!", [] { RGBBackColor(nullptr); }},
-    {"warning: RGBForeColor: Can't get current port!", [] { RGBForeColor(nullptr); }},
-    {"OpColor: Can't get port", [] { OpColor(nullptr); }},
-    {"warning: HiliteColor: Can't get current port!", [] { HiliteColor(nullptr); }},
     {"warning: SetCPixel: cannot get Qt port", [] { SetCPixel(0, 0, nullptr); }},
-    {"warning: GetPortPenLocation: cannot get Qt port",
-     [] { Point pt; QVERIFY(!GetPortPenLocation(nullptr, &pt)); }},
-    {"warning: GetPortPenMode: cannot get Qt port",
-     [] { QCOMPARE(GetPortPenMode(nullptr), SInt16(0)); }},
     {"PortSize: current port is NULL", [] { PortSize(10, 10); }},
-    {"SetOrigin: currentGrafPort = NULL", [] { SetOrigin(1, 1); }},
-    {"warning: PenPat: Can't get current port !", [] { PenPat(GetQDGlobalsGray(nullptr)); }},
-    {"warning: BackPat: Can't get current port !", [] { BackPat(GetQDGlobalsGray(nullptr)); }},
     {"warning: PenSize: Can't get current port !", [] { PenSize(1, 1); }},
-    {"warning: PenMode: Can't get current port !", [] { PenMode(patCopy); }},
-    {"warning: HidePen: Can't get current port !", [] { HidePen(); }},
-    {"warning: ShowPen: Can't get current port !", [] { ShowPen(); }},
-    {"warning: SetPenStyle: Can't get current port !", [] { SetPenStyle(1); }},
-    {"warning: GetPenStyle: Can't get current port !",
-     [] { QCOMPARE(GetPenStyle(), int(Qt::SolidLine)); }},
-    {"warning: GetPenState: Can't get current port !", [] { PenState s; GetPenState(&s); }},
-    {"warning: SetPenState: Can't get current port !", [] { PenState s; SetPenState(&s); }},
-    {"warning: PenNormal: Can't get current port !", [] { PenNormal(); }},
-    {"warning: GetPen: Can't get current port !", [] { Point pt; GetPen(&pt); }},
+    {"warning: LineTo: cannot get current port", [] { LineTo(1, 1); }},
+    {"warning: FrameRect: cannot get current port", [] { const Rect r = makeRect(0, 0, 9, 9); FrameRect(&r); }},
+    {"warning: FrameOval: cannot get current port", [] { const Rect r = makeRect(0, 0, 9, 9); FrameOval(&r); }},
 };
 
 } // namespace
@@ -162,34 +140,6 @@ private Q_SLOTS:
         QCOMPARE(world->painter->transform(), QTransform::fromTranslate(-2, -2));
     }
 
-    // Each colour call reaches its own field of the port; the pen location getter is not
-    // transposed.
-    void portStateGettersAndSetters()
-    {
-        World world(4);
-        const RGBColor fore(65535, 0, 0), back(0, 65535, 0), hilite(0, 0, 65535);
-        const RGBColor op(65535, 65535, 0), portOp(0, 65535, 65535);
-        RGBForeColor(&fore);
-        RGBBackColor(&back);
-        HiliteColor(&hilite);
-        OpColor(&op);
-        RGBColor c;
-        QCOMPARE(quint32(*GetPortForeColor(world, &c)), 0xFFFF0000u);
-        QCOMPARE(quint32(*GetPortBackColor(world, &c)), 0xFF00FF00u);
-        QCOMPARE(quint32(*GetPortHiliteColor(world, &c)), 0xFF0000FFu);
-        QCOMPARE(quint32(*GetPortOpColor(world, &c)), 0xFFFFFF00u);
-        SetPortOpColor(world, &portOp);
-        QCOMPARE(quint32(*GetPortOpColor(world, &c)), 0xFF00FFFFu);
-        GetBackColor(&c);
-        QCOMPARE(quint32(c), 0xFF00FF00u);
-        Point pt;
-        world->penX = 3;
-        world->penY = 2;
-        QCOMPARE(GetPortPenLocation(world, &pt), &pt);
-        QCOMPARE(pt.h, SInt16(3));
-        QCOMPARE(pt.v, SInt16(2));
-    }
-
     void noPortWarnings_data()
     {
         QTest::addColumn<int>("index");
@@ -271,20 +221,9 @@ private Q_SLOTS:
         QCOMPARE(GetCurrentPort(), nullptr);
     }
 
-    void cpixelRoundTrip_data()
-    {
-        QTest::addColumn<int>("r");
-        QTest::addColumn<int>("g");
-        QTest::addColumn<int>("b");
-        QTest::newRow("black") << 0 << 0 << 0;
-        QTest::newRow("white") << 65535 << 65535 << 65535;
-        QTest::newRow("mixed") << 0x1234 << 0x8000 << 0xFEDC;
-    }
     void cpixelRoundTrip()
     {
-        QFETCH(int, r);
-        QFETCH(int, g);
-        QFETCH(int, b);
+        const int r = 0x1234, g = 0x8000, b = 0xFEDC;
         World world(4);
         const RGBColor in(r, g, b);
         SetCPixel(2, 3, &in);

@@ -1,11 +1,10 @@
 // Rectangle utilities: the Toolbox field order and the deliberate departures (SectRect leaving
 // its result alone for empty inputs, null pointers counting as empty or left out).
-#include "ShapeTestWorld.h"
+#include "QuickDrawTestSupport.h"
 
-#include <Velmar/Diagnostics.h>
 
 using namespace Velmar;
-using namespace ShapeTest;
+using namespace QDTest;
 
 namespace {
 

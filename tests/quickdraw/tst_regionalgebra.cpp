@@ -1,14 +1,13 @@
 // Region handles and arithmetic, checked by set identities and exact pixel sets rather than
 // by restating the calls.
-#include "ShapeTestWorld.h"
+#include "QuickDrawTestSupport.h"
 
-#include <Velmar/Diagnostics.h>
 
 #include <QBitArray>
 #include <QRandomGenerator>
 
 using namespace Velmar;
-using namespace ShapeTest;
+using namespace QDTest;
 
 namespace {
 

@@ -1,14 +1,13 @@
 // Regions on a port: recording with OpenRgn/CloseRgn, drawing (exact pixel sets), the hilite
 // inversion, clip calls, the desktop region, and recording misuse.
-#include "ShapeTestWorld.h"
+#include "QuickDrawTestSupport.h"
 
-#include <Velmar/Diagnostics.h>
 
 #include <QGuiApplication>
 #include <QScreen>
 
 using namespace Velmar;
-using namespace ShapeTest;
+using namespace QDTest;
 
 namespace {
 

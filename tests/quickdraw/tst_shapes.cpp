@@ -1,13 +1,11 @@
 // Rectangles, ovals, arcs, rounded rectangles and lines drawn into an offscreen world and
 // read back: exact pixel sets where the Toolbox fixes them, containment where it does not.
-#include "ShapeTestWorld.h"
+#include "QuickDrawTestSupport.h"
 
-#include <Velmar/Diagnostics.h>
 
-#include "quickdraw/GrafPortPrivate.h"
 
 using namespace Velmar;
-using namespace ShapeTest;
+using namespace QDTest;
 
 namespace {
 

@@ -1,13 +1,17 @@
-// Shared helpers of the shape and region tests: an offscreen world made current, with pixel
-// read-back, owned regions, recorded polygons and the assertion check.
+// Shared helpers of the QuickDraw tests: an offscreen world made current, pixel read-back,
+// owned regions, recorded polygons and the assertion check.
 #pragma once
 
-#include "TestSupport.h"
-
+#include <Velmar/Diagnostics.h>
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
 #include <Velmar/QtGrafPort.h>
 #include <Velmar/QuickDraw.h>
+
+#include "TestSupport.h"
+#include "foundation/Conversions.h"
+#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/PortPainter.h"
 
 #include <QImage>
 #include <QPolygon>
@@ -15,13 +19,12 @@
 
 #include <memory>
 
-namespace ShapeTest {
+namespace QDTest {
 
 inline Rect R(int top, int left, int bottom, int right)
 {
     return Rect{std::int16_t(top), std::int16_t(left), std::int16_t(bottom), std::int16_t(right)};
 }
-
 inline Point P(int h, int v)
 {
     Point p;
@@ -30,32 +33,31 @@ inline Point P(int h, int v)
     return p;
 }
 
-// A white world of the given size at (0, 0), current while it lives; the previous port
-// comes back afterwards.
+// A white 32-bit world with its top-left at (0, 0), made current. Disposed with the scope
+// unless the test has disposed of it already.
 class World {
 public:
-    explicit World(int width = 100, int height = 100)
+    explicit World(int width = 100, int height = 0)
     {
-        Velmar::GetPort(&m_previous);
-        const Rect bounds = R(0, 0, height, width);
+        const Rect bounds = R(0, 0, height ? height : width, width);
         Velmar::NewGWorld(&m_port, 32, &bounds, nullptr, nullptr, 0);
         Velmar::SetPort(m_port);
     }
     ~World()
     {
-        Velmar::SetPort(m_previous);
-        Velmar::DisposeGWorld(m_port);
+        if (Velmar::IsValidPort(m_port))
+            Velmar::DisposeGWorld(m_port);
     }
     World(const World&) = delete;
     World& operator=(const World&) = delete;
 
+    operator Velmar::GrafPtr() const { return m_port; }
+    Velmar::GrafPtr operator->() const { return m_port; }
     Velmar::GrafPtr port() const { return m_port; }
-    // The pixel as drawn so far (the painter is ended so that everything has landed).
-    QRgb pixel(int x, int y) const
-    {
-        m_port->EndPaint();
-        return m_port->image()->pixel(x, y);
-    }
+    QImage& image() const { return *m_port->image(); }
+    QRgb pixel(int x, int y) const { return m_port->image()->pixel(x, y); }
+    // The port's painter, started as a drawing call starts it.
+    QPainter* painter() const { return Velmar::Private::portPainter(m_port, "test"); }
     // Every pixel that is not the given colour, as (x, y) points.
     QSet<QPoint> touched(QRgb background = 0xFFFFFFFF) const
     {
@@ -71,7 +73,6 @@ public:
 
 private:
     Velmar::GrafPtr m_port = nullptr;
-    Velmar::GrafPtr m_previous = nullptr;
 };
 
 // The pixels of a region, as (x, y) points.
@@ -135,4 +136,4 @@ inline bool assertedWith(const VelmarTest::ScriptedAutomationListener& l, const 
     return false;
 }
 
-} // namespace ShapeTest
+} // namespace QDTest
