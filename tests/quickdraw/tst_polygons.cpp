@@ -2,7 +2,6 @@
 // (nested opens, closing without opening, killing an open polygon, too few points).
 #include "QuickDrawTestSupport.h"
 
-
 using namespace Velmar;
 using namespace QDTest;
 

@@ -2,6 +2,7 @@
 // pixels and scrolling.
 #include "QuickDrawTestSupport.h"
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -159,38 +160,53 @@ private Q_SLOTS:
         QCOMPARE(log.lines(), QStringList());
     }
 
-    void dirtyMarkingReachesTheWindow()
+    // What a call names is reported to the port's window in widget coordinates: exactly the
+    // union for the port's own painter, and a covering rectangle well short of the whole port
+    // (what a call naming nothing reports) for the drawing calls.
+    void dirtyMarking()
     {
         HookScope hooks;
-        QtGrafPort* port = newWindowPort(50, 40);
-        QCOMPARE(port->window, kFakeWindow);
+        QtGrafPort* port = newWindowPort(100, 100);
         QCOMPARE(port->image()->pixel(0, 0), qRgb(255, 255, 255)); // content colour
         SetPort(port);
-        {
-            MakeQPainter p("test");
-            QVERIFY(!!p);
-            p |= QRect(5, 5, 10, 10);
-            p |= QRect(20, 5, 2, 2);
-        }
-        QCOMPARE(gDirty, QList<QRect>{QRect(5, 5, 17, 10)});
-        gDirty.clear();
-        {
-            MakeQPainter p("test"); // nothing named: the whole port
-        }
-        QCOMPARE(gDirty, QList<QRect>{QRect(0, 0, 50, 40)});
-        gDirty.clear();
-        {
-            MakeQPainter p("test");
-            p |= QRect(0, 0, 30, 30);
-            p &= QRect(10, 10, 100, 100);
-        }
-        QCOMPARE(gDirty, QList<QRect>{QRect(10, 10, 20, 20)});
-        // Dirty rectangles are reported in widget coordinates.
-        gDirty.clear();
-        SetOrigin(100, 100);
         const RGBColor red(65535, 0, 0);
-        SetCPixel(101, 102, &red);
-        QCOMPARE(gDirty, QList<QRect>{QRect(1, 2, 1, 1)});
+        const Rect r = R(10, 20, 30, 60);
+        const QRect q(20, 10, 40, 20), rq(30, 40, 20, 10), pq(10, 10, 31, 21);
+        QRegion region(rq);
+        QPolygon points({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
+        PolyPtr poly{&points};
+        const QList<std::tuple<const char*, std::function<void()>, QRect, bool>> cases = {
+            {"union of the named", [] { MakeQPainter p("test"); QVERIFY(!!p); p |= QRect(5, 5, 10, 10);
+                                        p |= QRect(20, 5, 2, 2); }, QRect(5, 5, 17, 10), true},
+            {"nothing named", [] { MakeQPainter p("test"); }, QRect(0, 0, 100, 100), true},
+            {"clipped", [] { MakeQPainter p("test"); p |= QRect(0, 0, 30, 30); p &= QRect(10, 10, 100, 100); },
+             QRect(10, 10, 20, 20), true},
+            {"widget coordinates", [&] { SetOrigin(100, 100); SetCPixel(101, 102, &red); SetOrigin(0, 0); },
+             QRect(1, 2, 1, 1), true},
+            {"FrameRect", [&] { FrameRect(&r); }, q, false},
+            {"PaintRect", [&] { PaintRect(&r); }, q, false},
+            {"FillRect", [&] { FillRect(&r, GetQDGlobalsGray(nullptr)); }, q, false},
+            {"PaintOval", [&] { PaintOval(&r); }, q, false},
+            {"FrameArc", [&] { FrameArc(&r, 0, 90); }, q, false},
+            {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, q, false},
+            {"LineTo", [&] { MoveTo(5, 70); LineTo(50, 60); }, QRect(5, 60, 46, 11), false},
+            {"PaintRgn", [&] { PaintRgn(&region); }, rq, false},
+            {"FrameRgn", [&] { FrameRgn(&region); }, rq, false},
+            {"InvertRgn", [&] { InvertRgn(&region); }, rq, false},
+            {"FramePoly", [&] { FramePoly(&poly); }, pq, false},
+            {"PaintPoly", [&] { PaintPoly(&poly); }, pq, false},
+        };
+        for (const auto& [name, draw, expected, exact] : cases) {
+            gDirty.clear();
+            draw();
+            QRect dirty;
+            for (const QRect& d : gDirty)
+                dirty |= d;
+            if (exact)
+                QVERIFY2(gDirty == QList<QRect>{expected}, name);
+            else
+                QVERIFY2(dirty.contains(expected) && dirty.width() < 90 && dirty.height() < 90, name);
+        }
         // A window port is not disposed through the offscreen calls.
         DisposePort(port);
         QVERIFY(IsValidPort(port));

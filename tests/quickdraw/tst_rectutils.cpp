@@ -2,7 +2,6 @@
 // its result alone for empty inputs, null pointers counting as empty or left out).
 #include "QuickDrawTestSupport.h"
 
-
 using namespace Velmar;
 using namespace QDTest;
 

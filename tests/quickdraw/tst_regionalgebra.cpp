@@ -2,7 +2,6 @@
 // by restating the calls.
 #include "QuickDrawTestSupport.h"
 
-
 #include <QBitArray>
 #include <QRandomGenerator>
 

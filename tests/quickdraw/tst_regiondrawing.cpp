@@ -2,7 +2,6 @@
 // inversion, clip calls, the desktop region, and recording misuse.
 #include "QuickDrawTestSupport.h"
 
-
 #include <QGuiApplication>
 #include <QScreen>
 

@@ -2,21 +2,8 @@
 // read back: exact pixel sets where the Toolbox fixes them, containment where it does not.
 #include "QuickDrawTestSupport.h"
 
-
-
 using namespace Velmar;
 using namespace QDTest;
-
-namespace {
-
-// Collects what the port reports dirty to its window.
-QList<QRect> gDirty;
-void markDirty(AQtWindow*, const QRect& r)
-{
-    gDirty.append(r);
-}
-
-} // namespace
 
 class TestShapes : public QObject {
     Q_OBJECT
@@ -27,8 +14,7 @@ private Q_SLOTS:
     // colour; a pen wider than half the rectangle covers all of it, never more.
     void frameRect()
     {
-        for (const auto& [w, r] : {std::pair{1, R(10, 10, 20, 20)}, {2, R(10, 10, 30, 40)},
-                                   {3, R(10, 10, 30, 40)}, {4, R(10, 10, 30, 40)}, {5, R(10, 10, 14, 13)}}) {
+        for (const auto& [w, r] : {std::pair{1, R(10, 10, 20, 20)}, {3, R(10, 10, 30, 40)}, {5, R(10, 10, 14, 13)}}) {
             World world;
             PenSize(short(w), short(w));
             FrameRect(&r);
@@ -195,83 +181,6 @@ private Q_SLOTS:
         VelmarTest::LogCapture log;
         StdRect(42, &r);
         QVERIFY(log.contains("StdRect"));
-    }
-
-    void withoutPortEveryCallWarns()
-    {
-        GrafPtr saved = nullptr;
-        GetPort(&saved);
-        SetPort(nullptr);
-        const Rect r = R(0, 0, 10, 10);
-        const QList<std::pair<const char*, std::function<void()>>> cases = {
-            {"warning: FrameRect: cannot get current port", [&] { FrameRect(&r); }},
-            {"warning: PaintRect: Can't get current port!", [&] { PaintRect(&r); }},
-            {"warning: FrameOval: cannot get current port", [&] { FrameOval(&r); }},
-            {"warning: FrameRoundRect: cannot get current port", [&] { FrameRoundRect(&r, 2, 2); }},
-            {"warning: MoveTo: cannot get current port", [] { MoveTo(1, 1); }},
-            {"warning: Move: cannot get current port", [] { Move(1, 1); }},
-            {"warning: LineTo: cannot get current port", [] { LineTo(1, 1); }},
-            {"warning: Line: cannot get current port", [] { Line(1, 1); }},
-            {"warning: StdRect: cannot get current port", [&] { StdRect(kQDGrafVerbFrame, &r); }},
-            {"warning: DrawLinesFromPointPairs: cannot get Qt port",
-             [] { DrawLinesFromPointPairs({QPoint(0, 0), QPoint(1, 1)}); }}};
-        for (const auto& [text, call] : cases) {
-            VelmarTest::LogCapture log;
-            call();
-            QVERIFY2(log.contains(QString::fromLatin1(text)), text);
-        }
-        SetPort(saved);
-    }
-
-    // Each drawing call reports what it touched to the port's window, precisely: not the
-    // whole port, which is what a call that named nothing reports.
-    void drawingMarksDirty()
-    {
-        const Private::PortWindowHooks saved = Private::portWindowHooks();
-        Private::PortWindowHooks hooks = saved;
-        hooks.markDirty = &markDirty;
-        Private::setPortWindowHooks(hooks);
-        int fakeWindow = 0;
-        auto* port = new QtGrafPort(reinterpret_cast<AQtWindow*>(&fakeWindow), QRect(0, 0, 100, 100),
-                                    new QImage(100, 100, QImage::Format_ARGB32_Premultiplied));
-        GrafPtr previous = nullptr;
-        GetPort(&previous);
-        SetPort(port);
-        const Rect r = R(10, 20, 30, 60);
-        const QRect q(20, 10, 40, 20), rq(30, 40, 20, 10), pq(10, 10, 31, 21);
-        QRegion region(rq);
-        RgnHandle rgn = &region;
-        QPolygon points({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
-        PolyPtr poly{&points};
-        const QList<std::tuple<const char*, std::function<void()>, QRect>> cases = {
-            {"FrameRect", [&] { FrameRect(&r); }, q},
-            {"PaintRect", [&] { PaintRect(&r); }, q},
-            {"InvertRect", [&] { InvertRect(&r); }, q},
-            {"PaintOval", [&] { PaintOval(&r); }, q},
-            {"FrameOval", [&] { FrameOval(&r); }, q},
-            {"FrameArc", [&] { FrameArc(&r, 0, 90); }, q},
-            {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, q},
-            {"LineTo", [&] { MoveTo(5, 70); LineTo(50, 60); }, QRect(5, 60, 46, 11)},
-            {"EraseRect", [&] { EraseRect(&r); }, q},
-            {"FillRect", [&] { FillRect(&r, GetQDGlobalsGray(nullptr)); }, q},
-            {"PaintRgn", [&] { PaintRgn(rgn); }, rq},
-            {"FrameRgn", [&] { FrameRgn(rgn); }, rq},
-            {"InvertRgn", [&] { InvertRgn(rgn); }, rq},
-            {"FramePoly", [&] { FramePoly(&poly); }, pq},
-            {"PaintPoly", [&] { PaintPoly(&poly); }, pq},
-        };
-        for (const auto& [name, draw, mustCover] : cases) {
-            gDirty.clear();
-            draw();
-            QRect dirty;
-            for (const QRect& d : gDirty)
-                dirty |= d;
-            QVERIFY2(dirty.contains(mustCover), name);
-            QVERIFY2(dirty.width() < 90 && dirty.height() < 90, name);
-        }
-        SetPort(previous);
-        delete port;
-        Private::setPortWindowHooks(saved);
     }
 };
 
