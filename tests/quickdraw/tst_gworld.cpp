@@ -12,12 +12,10 @@ QString text(const Rect& r)
 {
     return QStringLiteral("%1,%2,%3,%4").arg(r.top).arg(r.left).arg(r.bottom).arg(r.right);
 }
-
 QString boundsOf(GrafPtr port)
 {
     Rect r;
-    GetPortBounds(port, &r);
-    return text(r);
+    return text(*GetPortBounds(port, &r));
 }
 
 } // namespace
@@ -135,8 +133,7 @@ private Q_SLOTS:
     void updateGWorldKeepsTopLeftPixels()
     {
         World world(20);
-        const RGBColor red(65535, 0, 0);
-        const RGBColor blue(0, 0, 65535);
+        const RGBColor red(65535, 0, 0), blue(0, 0, 65535);
         SetCPixel(0, 0, &red);
         SetCPixel(9, 9, &blue);
         SetCPixel(15, 15, &blue); // cut off by the shrink

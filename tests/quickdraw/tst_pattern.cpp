@@ -1,5 +1,4 @@
-// Patterns: bit order and phase, recolouring with the port's colours, pen-mode composition
-// and brush caching.
+// Patterns: bit order and phase, recolouring with the port's colours, pen-mode composition.
 #include "QuickDrawTestSupport.h"
 
 #include <cstring>
@@ -17,8 +16,7 @@ const QRgb kUnderneath = qRgb(0, 255, 0);
 struct InkedWorld : World {
     explicit InkedWorld(int size) : World(size)
     {
-        const RGBColor ink(65535, 0, 0);
-        const RGBColor paper(0, 0, 65535);
+        const RGBColor ink(65535, 0, 0), paper(0, 0, 65535);
         RGBForeColor(&ink);
         RGBBackColor(&paper);
     }
@@ -48,15 +46,6 @@ QStringList pixelRows(const World& world)
         rows << row;
     }
     return rows;
-}
-
-// 24 rows of 24 pixels repeating the 8-pixel `rows` (which repeat down the tile).
-QStringList tiled(const QStringList& rows)
-{
-    QStringList out;
-    for (int y = 0; y < 24; ++y)
-        out << rows[y % rows.size()].repeated(3);
-    return out;
 }
 
 // The documented rule: the pixel at (x, y) takes the ink when bit (x mod 8) of the
@@ -96,25 +85,20 @@ private Q_SLOTS:
         QTest::addColumn<QStringList>("rows"); // one 8-pixel tile, top row first
         QTest::newRow("black") << 0 << QByteArray(8, '\xFF') << QStringList{"########"};
         QTest::newRow("white") << 1 << QByteArray(8, '\0') << QStringList{"........"};
-        QTest::newRow("gray") << 2 << QByteArray::fromHex("55AA55AA55AA55AA")
-                              << QStringList{".#.#.#.#", "#.#.#.#."};
-        QTest::newRow("light gray") << 3 << QByteArray::fromHex("2288228822882288")
-                                    << QStringList{"#.###.##", "###.###."};
-        QTest::newRow("dark gray") << 4 << QByteArray::fromHex("DD77DD77DD77DD77")
-                                   << QStringList{".#...#..", "...#...#"};
+        QTest::newRow("gray") << 2 << QByteArray::fromHex("55AA55AA55AA55AA") << QStringList{".#.#.#.#", "#.#.#.#."};
+        QTest::newRow("light gray") << 3 << QByteArray::fromHex("2288228822882288") << QStringList{"#.###.##", "###.###."};
+        QTest::newRow("dark gray") << 4 << QByteArray::fromHex("DD77DD77DD77DD77") << QStringList{".#...#..", "...#...#"};
         // Bit 0 of a byte is its leftmost pixel, and set bits are paper.
         QTest::newRow("any bytes") << -1 << QByteArray::fromHex("0102800FF03C817E")
-                                   << QStringList{".#######", "#.######", "#######.", "....####",
-                                                  "####....", "##....##", ".######.", "#......#"};
+            << QStringList{".#######", "#.######", "#######.", "....####", "####....", "##....##", ".######.", "#......#"};
     }
     void patternPixels()
     {
         QFETCH(int, standard);
         QFETCH(QByteArray, bytes);
         QFETCH(QStringList, rows);
-        static const PatPtr& (*const kStandard[])(Pattern*) = {
-            GetQDGlobalsBlack, GetQDGlobalsWhite, GetQDGlobalsGray, GetQDGlobalsLightGray,
-            GetQDGlobalsDarkGray};
+        static const PatPtr& (*const kStandard[])(Pattern*) = {GetQDGlobalsBlack, GetQDGlobalsWhite,
+            GetQDGlobalsGray, GetQDGlobalsLightGray, GetQDGlobalsDarkGray};
         InkedWorld world(24);
         Pattern p{};
         if (standard < 0)
@@ -123,7 +107,10 @@ private Q_SLOTS:
         QCOMPARE(QByteArray(reinterpret_cast<const char*>(p.pat), 8), bytes);
         paint(world, QRect(0, 0, 24, 24));
         // Every pixel is ink or paper as the rows say, repeating every 8 pixels.
-        QCOMPARE(pixelRows(world), tiled(rows));
+        QStringList tiled;
+        for (int y = 0; y < 24; ++y)
+            tiled << rows[y % rows.size()].repeated(3);
+        QCOMPARE(pixelRows(world), tiled);
     }
 
     void phaseIsAnchoredAtLocalZero()
@@ -213,28 +200,6 @@ private Q_SLOTS:
         world.image().setPixel(1, 1, 0);
         paint(world, QRect(0, 0, 8, 8));
         QCOMPARE(world.pixel(1, 1), kInk);
-    }
-
-    void recolouredBrushesAreCached()
-    {
-        const auto textureKey = [](GrafPtr port) {
-            return Private::resolvedFillBrush(port).texture().cacheKey();
-        };
-        InkedWorld world(8);
-        PenPat(GetQDGlobalsGray(nullptr));
-        const qint64 first = textureKey(world);
-        QCOMPARE(textureKey(world), first);
-        const RGBColor other(0, 65535, 0);
-        RGBForeColor(&other);
-        QVERIFY(textureKey(world) != first);
-        const RGBColor ink(65535, 0, 0);
-        RGBForeColor(&ink);
-        // Back to the first colours: the process-wide cache gives the same texture again.
-        QCOMPARE(textureKey(world), first);
-        // A second port with the same pattern and colours shares it as well.
-        InkedWorld world2(8);
-        PenPat(GetQDGlobalsGray(nullptr));
-        QCOMPARE(textureKey(world2), first);
     }
 
     void directPainterChangesNeedInkChanged()

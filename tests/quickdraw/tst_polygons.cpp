@@ -21,8 +21,7 @@ private Q_SLOTS:
         LineTo(10, 10);
         ClosePoly();
         QVERIFY(world.touched().isEmpty());
-        QCOMPARE(*poly->qPoly, QPolygon({QPoint(10, 10), QPoint(40, 10), QPoint(40, 40),
-                                         QPoint(10, 10)}));
+        QCOMPARE(*poly->qPoly, QPolygon({QPoint(10, 10), QPoint(40, 10), QPoint(40, 40), QPoint(10, 10)}));
         Point pen{};
         GetPen(&pen);
         QVERIFY(pen.h == 10 && pen.v == 10);
@@ -41,8 +40,7 @@ private Q_SLOTS:
     {
         World world;
         // A five-pointed star drawn in one stroke: its centre is enclosed twice.
-        PolyPtr* poly = recordPoly({QPoint(50, 5), QPoint(79, 95), QPoint(2, 39), QPoint(98, 39),
-                                    QPoint(21, 95), QPoint(50, 5)});
+        PolyPtr* poly = recordPoly({QPoint(50, 5), QPoint(79, 95), QPoint(2, 39), QPoint(98, 39), QPoint(21, 95), QPoint(50, 5)});
         PaintPoly(poly);
         const QSet<QPoint> got = world.touched();
         QVERIFY(got.contains(QPoint(50, 20)));  // a point of the star

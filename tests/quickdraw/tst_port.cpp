@@ -35,12 +35,9 @@ QtGrafPort* newWindowPort(int width, int height)
     return new QtGrafPort(kFakeWindow, QRect(0, 0, width, height), image);
 }
 
-// Every call that needs the current port, and the exact line it logs without one.
-struct NoPortCase {
-    const char* warning;
-    void (*call)();
-};
-const NoPortCase kNoPortCases[] = { // one call per source file
+// Calls that need the current port (one per source file), and the exact line each logs
+// without one.
+const std::pair<const char*, void (*)()> kNoPortCases[] = {
     {"warning: PaintOval: Can't get current port!", [] { QVERIFY(!MakeQPainter("PaintOval")); }},
     {"warning: GetForeColor: Can't get current port!",
      [] { RGBColor c(7, 7, 7); GetForeColor(&c); QCOMPARE(c.red, (unsigned short)7); }},
@@ -67,8 +64,7 @@ private Q_SLOTS:
     void currentPortAndInvalidPorts()
     {
         VelmarTest::LogCapture log;
-        World a(4);
-        World b(4);
+        World a(4), b(4);
         SetPort(a);
         GrafPtr got = nullptr;
         GetPort(&got);
@@ -141,23 +137,19 @@ private Q_SLOTS:
         QCOMPARE(world->painter->transform(), QTransform::fromTranslate(-2, -2));
     }
 
-    void noPortWarnings_data()
-    {
-        QTest::addColumn<int>("index");
-        for (int i = 0; i < int(std::size(kNoPortCases)); ++i)
-            QTest::newRow(kNoPortCases[i].warning) << i;
-    }
     void noPortWarnings()
     {
-        QFETCH(int, index);
-        VelmarTest::LogCapture log;
-        kNoPortCases[index].call();
-        QVERIFY(log.contains(QLatin1String(kNoPortCases[index].warning)));
-        // A disabled category writes nothing.
-        SetLogCategory(kLogQuickDraw, false);
-        log.clear();
-        kNoPortCases[index].call();
-        QCOMPARE(log.lines(), QStringList());
+        for (const auto& [warning, call] : kNoPortCases) {
+            SetLogCategory(kLogQuickDraw, true);
+            VelmarTest::LogCapture log;
+            call();
+            QVERIFY2(log.contains(QLatin1String(warning)), warning);
+            // A disabled category writes nothing.
+            SetLogCategory(kLogQuickDraw, false);
+            log.clear();
+            call();
+            QVERIFY2(log.lines().isEmpty(), warning);
+        }
     }
 
     // What a call names is reported to the port's window in widget coordinates: exactly the

@@ -8,29 +8,22 @@
 using namespace Velmar;
 using namespace QDTest;
 
-namespace {
-
-QRegion lShape()
+static QRegion lShape()
 {
     return QRegion(10, 10, 30, 8).united(QRegion(10, 10, 8, 30));
 }
-
-} // namespace
 
 class TestRegionDrawing : public QObject {
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase() { SetLogCategory(kLogQuickDraw, true); }
 
-    // ---- Recording -----------------------------------------------------------------------
-
     // Frames XOR their shapes in, recorded lines become one odd-even polygon, painting still
     // draws; the destination's old content is replaced and the port's scratch state freed.
     void recording()
     {
         World world;
-        const Rect a = R(0, 0, 20, 20), b = R(10, 10, 30, 30), oval = R(20, 20, 30, 30);
-        const Rect small = R(0, 0, 5, 5);
+        const Rect a = R(0, 0, 20, 20), b = R(10, 10, 30, 30), oval = R(20, 20, 30, 30), small = R(0, 0, 5, 5);
         PolyPtr* square = recordPoly({QPoint(0, 0), QPoint(20, 0), QPoint(20, 20), QPoint(0, 20)});
         Rgn inner = rgnOf(QRegion(5, 5, 5, 5));
         const QList<std::tuple<const char*, std::function<void()>, QRegion, int>> cases = {
@@ -108,9 +101,8 @@ private Q_SLOTS:
         OpenRgn();
         CloseRgn(r.get());
         FrameRgn(r.get());
-        QVERIFY(log.contains("warning: OpenRgn: cannot get current port"));
-        QVERIFY(log.contains("warning: CloseRgn: cannot get current port"));
-        QVERIFY(log.contains("warning: FrameRgn: cannot get current port"));
+        for (const char* call : {"OpenRgn", "CloseRgn", "FrameRgn"})
+            QVERIFY(log.contains(QStringLiteral("warning: %1: cannot get current port").arg(QLatin1String(call))));
         SetPort(saved);
     }
 
@@ -122,8 +114,6 @@ private Q_SLOTS:
         MoveTo(1, 1);
         delete world;
     }
-
-    // ---- Drawing --------------------------------------------------------------------------
 
     void paintEraseFillRgn()
     {
@@ -218,8 +208,6 @@ private Q_SLOTS:
         QVERIFY(world.touched().isEmpty());
     }
 
-    // ---- Clip and desktop -------------------------------------------------------------------
-
     void clipCalls()
     {
         World world;
@@ -244,9 +232,8 @@ private Q_SLOTS:
         GetClip(got.get());
         SetClip(got.get());
         ClipRect(&r);
-        QVERIFY(log.contains("warning: GetClip: cannot get current port"));
-        QVERIFY(log.contains("warning: SetClip: cannot get current port"));
-        QVERIFY(log.contains("warning: ClipRect: cannot get current port"));
+        for (const char* call : {"GetClip", "SetClip", "ClipRect"})
+            QVERIFY(log.contains(QStringLiteral("warning: %1: cannot get current port").arg(QLatin1String(call))));
         SetPort(saved);
     }
 
