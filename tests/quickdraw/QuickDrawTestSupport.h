@@ -28,8 +28,7 @@ inline Rect R(int top, int left, int bottom, int right)
 inline Point P(int h, int v)
 {
     Point p;
-    p.h = std::int16_t(h);
-    p.v = std::int16_t(v);
+    p.h = std::int16_t(h), p.v = std::int16_t(v);
     return p;
 }
 
@@ -43,11 +42,7 @@ public:
         Velmar::NewGWorld(&m_port, 32, &bounds, nullptr, nullptr, 0);
         Velmar::SetPort(m_port);
     }
-    ~World()
-    {
-        if (Velmar::IsValidPort(m_port))
-            Velmar::DisposeGWorld(m_port);
-    }
+    ~World() { if (Velmar::IsValidPort(m_port)) Velmar::DisposeGWorld(m_port); }
     World(const World&) = delete;
     World& operator=(const World&) = delete;
 
@@ -106,11 +101,11 @@ inline QByteArray describe(const QSet<QPoint>& pixels)
         .arg(box.width()).arg(box.height()).toLatin1();
 }
 
+// An owned region handle holding `region`.
 struct RgnDeleter {
     void operator()(QRegion* r) const { Velmar::DisposeRgn(r); }
 };
 using Rgn = std::unique_ptr<QRegion, RgnDeleter>;
-
 inline Rgn rgnOf(const QRegion& region = QRegion())
 {
     Rgn r(Velmar::NewRgn());
@@ -128,6 +123,7 @@ inline Velmar::PolyPtr* recordPoly(const QList<QPoint>& points)
     return poly;
 }
 
+// Whether an assertion naming `expression` was put to the listener.
 inline bool assertedWith(const VelmarTest::ScriptedAutomationListener& l, const char* expression)
 {
     for (const auto& q : l.questions())

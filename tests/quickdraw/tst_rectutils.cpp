@@ -5,20 +5,14 @@
 using namespace Velmar;
 using namespace QDTest;
 
-namespace {
-
-bool same(const Rect& a, const Rect& b)
+static bool same(const Rect& a, const Rect& b)
 {
     return EqualRect(&a, &b) != 0;
 }
-
-QByteArray show(const Rect& r)
+static QByteArray show(const Rect& r)
 {
-    return QByteArray::number(r.top) + "," + QByteArray::number(r.left) + ","
-        + QByteArray::number(r.bottom) + "," + QByteArray::number(r.right);
+    return QStringLiteral("%1,%2,%3,%4").arg(r.top).arg(r.left).arg(r.bottom).arg(r.right).toLatin1();
 }
-
-} // namespace
 
 class TestRectUtils : public QObject {
     Q_OBJECT
@@ -28,8 +22,7 @@ private Q_SLOTS:
     void emptyRect()
     {
         for (const auto& [r, empty] : {std::pair{R(0, 0, 10, 10), false}, {R(5, 5, 6, 6), false},
-                                       {R(10, 10, 10, 20), true}, {R(10, 20, 30, 20), true},
-                                       {R(10, 10, 0, 0), true}})
+                                       {R(10, 10, 10, 20), true}, {R(10, 20, 30, 20), true}, {R(10, 10, 0, 0), true}})
             QVERIFY2((EmptyRect(&r) != 0) == empty, show(r));
     }
 
@@ -43,13 +36,10 @@ private Q_SLOTS:
             int dh, dv;
             Rect out;
         };
-        for (Case c : {Case{0, R(9, 9, 9, 9), 1, 2, R(2, 1, 4, 3)},
-                       Case{1, R(10, 20, 30, 40), 5, -5, R(5, 25, 25, 45)},
-                       Case{2, R(0, 0, 10, 10), 2, 3, R(3, 2, 7, 8)},
-                       Case{2, R(0, 0, 10, 10), -1, -2, R(-2, -1, 12, 11)},
-                       Case{2, R(0, 0, 10, 10), 5, 0, R(0, 0, 0, 0)},
-                       Case{2, R(5, 5, 10, 50), 0, 3, R(0, 0, 0, 0)},
-                       Case{2, R(0, 0, 11, 11), 5, 5, R(5, 5, 6, 6)}}) {
+        for (Case c : {Case{0, R(9, 9, 9, 9), 1, 2, R(2, 1, 4, 3)}, {1, R(10, 20, 30, 40), 5, -5, R(5, 25, 25, 45)},
+                       {2, R(0, 0, 10, 10), 2, 3, R(3, 2, 7, 8)}, {2, R(0, 0, 10, 10), -1, -2, R(-2, -1, 12, 11)},
+                       {2, R(0, 0, 10, 10), 5, 0, R(0, 0, 0, 0)}, {2, R(5, 5, 10, 50), 0, 3, R(0, 0, 0, 0)},
+                       {2, R(0, 0, 11, 11), 5, 5, R(5, 5, 6, 6)}}) {
             if (c.op == 0)
                 SetRect(&c.in, short(c.dh), short(c.dv), 3, 4);
             else
@@ -63,10 +53,8 @@ private Q_SLOTS:
     void sectRect()
     {
         for (const auto& [a, b, result, out] :
-             {std::tuple{R(0, 0, 10, 10), R(5, 5, 20, 20), 1, R(5, 5, 10, 10)},
-              {R(0, 0, 10, 10), R(2, 3, 4, 5), 1, R(2, 3, 4, 5)},
-              {R(0, 0, 10, 10), R(20, 20, 30, 30), 0, R(0, 0, 0, 0)},
-              {R(0, 0, 10, 10), R(0, 10, 10, 20), 0, R(0, 0, 0, 0)}}) {
+             {std::tuple{R(0, 0, 10, 10), R(5, 5, 20, 20), 1, R(5, 5, 10, 10)}, {R(0, 0, 10, 10), R(2, 3, 4, 5), 1, R(2, 3, 4, 5)},
+              {R(0, 0, 10, 10), R(20, 20, 30, 30), 0, R(0, 0, 0, 0)}, {R(0, 0, 10, 10), R(0, 10, 10, 20), 0, R(0, 0, 0, 0)}}) {
             Rect got = R(-7, -7, -7, -7);
             QCOMPARE(int(SectRect(&a, &b, &got)), result);
             QVERIFY2(same(got, out), show(got));
@@ -74,8 +62,7 @@ private Q_SLOTS:
             QCOMPARE(int(SectRect(&b, &a, &got)), result);
             QVERIFY2(same(got, out), show(got));
         }
-        const Rect sentinel = R(1, 2, 3, 4);
-        const Rect empty = R(10, 10, 10, 20), full = R(0, 0, 50, 50);
+        const Rect sentinel = R(1, 2, 3, 4), empty = R(10, 10, 10, 20), full = R(0, 0, 50, 50);
         Rect out = sentinel;
         QCOMPARE(SectRect(&empty, &full, &out), 0);
         QVERIFY(same(out, sentinel));

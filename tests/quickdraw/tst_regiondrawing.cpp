@@ -195,16 +195,13 @@ private Q_SLOTS:
     void nullRegionsDrawNothing()
     {
         World world;
-        PaintRgn(nullptr);
-        EraseRgn(nullptr);
-        FillRgn(nullptr, GetQDGlobalsBlack(nullptr));
-        FrameRgn(nullptr);
-        InvertRgn(nullptr);
-        StdRgn(kQDGrafVerbPaint, nullptr);
         Rgn empty = rgnOf();
-        PaintRgn(empty.get());
-        FrameRgn(empty.get());
-        InvertRgn(empty.get());
+        for (auto call : {PaintRgn, EraseRgn, FrameRgn, InvertRgn}) {
+            call(nullptr);
+            call(empty.get());
+        }
+        FillRgn(nullptr, GetQDGlobalsBlack(nullptr));
+        StdRgn(kQDGrafVerbPaint, nullptr);
         QVERIFY(world.touched().isEmpty());
     }
 

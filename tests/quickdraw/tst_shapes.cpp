@@ -75,12 +75,8 @@ private Q_SLOTS:
         const Rect box = R(0, 0, 10, 10);
         FillRect(&box, PatPtr(static_cast<const Pattern*>(nullptr)));
         QVERIFY(log.contains("warning: FillRect: null pattern"));
-        FrameRect(nullptr);
-        PaintRect(nullptr);
-        EraseRect(nullptr);
-        InvertRect(nullptr);
-        PaintOval(nullptr);
-        FrameOval(nullptr);
+        for (auto call : {FrameRect, PaintRect, EraseRect, InvertRect, PaintOval, FrameOval})
+            call(nullptr);
         PaintArc(nullptr, 0, 90);
         FrameRoundRect(nullptr, 4, 4);
         const Rect empty = R(10, 10, 10, 20), inverted = R(20, 20, 10, 10);
@@ -160,8 +156,7 @@ private Q_SLOTS:
         DrawLinesFromPointPairs({QPoint(0, 0), QPoint(4, 0), QPoint(0, 2), QPoint(4, 2), QPoint(9, 9)});
         QCOMPARE(world.touched(), rectPixels(0, 0, 5, 1) + rectPixels(0, 2, 5, 3));
         DrawPolylineFromPoints({QPoint(20, 20), QPoint(20, 24), QPoint(24, 24)});
-        QVERIFY(world.touched().contains(QPoint(20, 22)));
-        QVERIFY(world.touched().contains(QPoint(22, 24)));
+        QVERIFY(world.touched().contains(QPoint(20, 22)) && world.touched().contains(QPoint(22, 24)));
         DrawPolylineFromPoints({});
         DrawLinesFromPointPairs({QPoint(1, 1)});
     }
