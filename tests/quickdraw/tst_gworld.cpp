@@ -185,7 +185,7 @@ private Q_SLOTS:
         World world(40, 30);
         SetOrigin(100, 200);
         QCOMPARE(boundsOf(world), QStringLiteral("200,100,230,140"));
-        // Local (100, 200) is the image's top-left pixel.
+        // Local (139, 229) is the image's bottom-right pixel.
         const RGBColor red(65535, 0, 0);
         SetCPixel(139, 229, &red);
         QCOMPARE(world.pixel(39, 29), qRgb(255, 0, 0));

@@ -189,19 +189,6 @@ private Q_SLOTS:
         QCOMPARE(world.image(), before);
     }
 
-    void patBicDrawsBehindOpaquePixels()
-    {
-        InkedWorld world(8);
-        world.image().fill(kUnderneath);
-        PenMode(patBic);
-        paint(world, QRect(0, 0, 8, 8));
-        QCOMPARE(world.pixel(4, 4), kUnderneath);
-        // Where the image is transparent the ink shows.
-        world.image().setPixel(1, 1, 0);
-        paint(world, QRect(0, 0, 8, 8));
-        QCOMPARE(world.pixel(1, 1), kInk);
-    }
-
     void directPainterChangesNeedInkChanged()
     {
         InkedWorld world(4);

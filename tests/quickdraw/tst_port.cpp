@@ -231,18 +231,14 @@ private Q_SLOTS:
 
     void cpixelRoundTrip()
     {
-        const int r = 0x1234, g = 0x8000, b = 0xFEDC;
         World world(4);
-        const RGBColor in(r, g, b);
+        const RGBColor in(0x1234, 0x8000, 0xFEDC);
         SetCPixel(2, 3, &in);
         RGBColor out;
         GetCPixel(2, 3, &out);
         // Stored as opaque 8-bit ARGB with the library's channel scale.
-        using Private::channel16To8;
-        using Private::channel8To16;
-        QCOMPARE(out.red, channel8To16(channel16To8(r)));
-        QCOMPARE(out.green, channel8To16(channel16To8(g)));
-        QCOMPARE(out.blue, channel8To16(channel16To8(b)));
+        const auto scaled = [](int c) { return Private::channel8To16(Private::channel16To8(c)); };
+        QCOMPARE(QList<int>({out.red, out.green, out.blue}), QList<int>({scaled(0x1234), scaled(0x8000), scaled(0xFEDC)}));
         QCOMPARE(qAlpha(world.pixel(2, 3)), 255);
         // Exactly that one pixel changed.
         QImage expected(4, 4, QImage::Format_ARGB32_Premultiplied);
