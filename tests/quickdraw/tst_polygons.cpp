@@ -147,7 +147,6 @@ private Q_SLOTS:
         QVERIFY(assertedWith(listener, "!!port"));
         QVERIFY(poly && poly->qPoly && poly->qPoly->isEmpty());
         KillPoly(poly);
-        SetPort(world.port());
     }
 };
 
