@@ -5,6 +5,7 @@
 set -euo pipefail
 root="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 "$root/scripts/deps.sh"
+if [ -z "${XDG_RUNTIME_DIR:-}" ]; then export XDG_RUNTIME_DIR="$(mktemp -d)"; fi
 export VELMAR_BUILD_DIR="${VELMAR_BENCH_BUILD_DIR:-$root/build-release}"
 export VELMAR_CMAKE_ARGS="-DCMAKE_BUILD_TYPE=Release -DVELMAR_BUILD_TESTS=OFF ${VELMAR_CMAKE_ARGS:-}"
 build="$("$root/scripts/configure.sh")"

@@ -4,14 +4,18 @@ import sys
 
 
 def load(paths):
-    times = {}
+    """CPU time in ns per benchmark: the median when repetitions were run, else the run."""
+    times, medians = {}, {}
     for path in paths:
         with open(path) as f:
             for b in json.load(f)["benchmarks"]:
-                if b.get("run_type", "iteration") != "iteration":
-                    continue
                 scale = {"ns": 1.0, "us": 1e3, "ms": 1e6, "s": 1e9}[b.get("time_unit", "ns")]
-                times[b["name"]] = b["cpu_time"] * scale
+                name = b.get("run_name", b["name"])
+                if b.get("run_type", "iteration") == "iteration":
+                    times[name] = b["cpu_time"] * scale
+                elif b.get("aggregate_name") == "median":
+                    medians[name] = b["cpu_time"] * scale
+    times.update(medians)
     return times
 
 
