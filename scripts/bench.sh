@@ -4,22 +4,15 @@
 # the benchmarks that stand alone. Extra arguments go to every benchmark program.
 set -euo pipefail
 root="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
-"$root/scripts/deps.sh"
-if [ -z "${XDG_RUNTIME_DIR:-}" ]; then export XDG_RUNTIME_DIR="$(mktemp -d)"; fi
 export VELMAR_BUILD_DIR="${VELMAR_BENCH_BUILD_DIR:-$root/build-release}"
 export VELMAR_CMAKE_ARGS="-DCMAKE_BUILD_TYPE=Release -DVELMAR_BUILD_TESTS=OFF ${VELMAR_CMAKE_ARGS:-}"
-build="$("$root/scripts/configure.sh")"
+source "$root/scripts/prepare.sh"
 cmake --build "$build"
 out="$(mktemp -d)"
-run() {
-  for exe in "$build"/bench/bench_*; do
-    [ -f "$exe" ] && [ -x "$exe" ] || continue
-    "$exe" --benchmark_format=json --benchmark_out="$out/$(basename "$exe").json" \
-      --benchmark_out_format=json "$@" >/dev/null
-  done
-}
-if [ -n "${DISPLAY:-}" ]; then run "$@"; else
-  export -f run; export build out
-  QT_QPA_PLATFORM="${QT_QPA_PLATFORM:-offscreen}" bash -c 'run "$@"' _ "$@"
-fi
+[ -n "${DISPLAY:-}" ] || export QT_QPA_PLATFORM="${QT_QPA_PLATFORM:-offscreen}"
+for exe in "$build"/bench/bench_*; do
+  [ -f "$exe" ] && [ -x "$exe" ] || continue
+  "$exe" --benchmark_format=json --benchmark_out="$out/$(basename "$exe").json" \
+    --benchmark_out_format=json "$@" >/dev/null
+done
 python3 "$root/scripts/bench_table.py" "$out"/*.json

@@ -3,10 +3,7 @@
 # saves a screenshot instead.
 set -euo pipefail
 root="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
-"$root/scripts/deps.sh"
-# Qt wants a private runtime directory; give it one rather than a warning per process.
-if [ -z "${XDG_RUNTIME_DIR:-}" ]; then export XDG_RUNTIME_DIR="$(mktemp -d)"; fi
-build="$("$root/scripts/configure.sh")"
+source "$root/scripts/prepare.sh"
 cmake --build "$build" --target velmar-demo
 demo="$build/examples/demo/velmar-demo"
 if [ -n "${DISPLAY:-}" ]; then
