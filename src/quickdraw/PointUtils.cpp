@@ -1,6 +1,7 @@
 // Point utilities.
 #include <Velmar/QDShapes.h>
 
+#include "foundation/Conversions.h"
 #include "quickdraw/ShapeLog.h"
 
 namespace Velmar {
@@ -15,7 +16,7 @@ void SetPt(Point* pt, short h, short v)
 
 unsigned char EqualPt(Point a, Point b)
 {
-    return (a.h == b.h && a.v == b.v) ? 1 : 0;
+    return Private::samePoint(a, b) ? 1 : 0;
 }
 
 void AddPt(Point src, Point* dst)

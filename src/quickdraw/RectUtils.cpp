@@ -8,21 +8,12 @@
 
 namespace Velmar {
 
-using Private::toQRect;
+using Private::isEmptyRect;
+using Private::makeRect;
+using Private::sameRect;
 using Private::shapeWarning;
+using Private::toQRect;
 using Private::toRect;
-
-namespace {
-
-void store(Rect* r, int left, int top, int right, int bottom)
-{
-    r->top = std::int16_t(top);
-    r->left = std::int16_t(left);
-    r->bottom = std::int16_t(bottom);
-    r->right = std::int16_t(right);
-}
-
-} // namespace
 
 void SetRect(Rect* r, short left, short top, short right, short bottom)
 {
@@ -30,7 +21,7 @@ void SetRect(Rect* r, short left, short top, short right, short bottom)
         shapeWarning("warning: SetRect: null rectangle");
         return;
     }
-    store(r, left, top, right, bottom);
+    *r = makeRect(left, top, right, bottom);
 }
 
 void OffsetRect(Rect* r, short dh, short dv)
@@ -39,7 +30,7 @@ void OffsetRect(Rect* r, short dh, short dv)
         shapeWarning("warning: OffsetRect: null rectangle");
         return;
     }
-    store(r, r->left + dh, r->top + dv, r->right + dh, r->bottom + dv);
+    *r = makeRect(r->left + dh, r->top + dv, r->right + dh, r->bottom + dv);
 }
 
 void InsetRect(Rect* r, short dh, short dv)
@@ -49,16 +40,14 @@ void InsetRect(Rect* r, short dh, short dv)
     const int left = r->left + dh, right = r->right - dh;
     const int top = r->top + dv, bottom = r->bottom - dv;
     if (right - left < 1 || bottom - top < 1)
-        store(r, 0, 0, 0, 0);
+        *r = makeRect(0, 0, 0, 0);
     else
-        store(r, left, top, right, bottom);
+        *r = makeRect(left, top, right, bottom);
 }
 
 unsigned char EmptyRect(const Rect* r)
 {
-    if (!r)
-        return 1;
-    return (r->left > r->right - 1 || r->top > r->bottom - 1) ? 1 : 0;
+    return isEmptyRect(r) ? 1 : 0;
 }
 
 // Leaves `out` alone for a null or empty input, unlike the classic call that clears it.
@@ -74,9 +63,9 @@ unsigned char SectRect(const Rect* a, const Rect* b, Rect* out)
         return meet ? 1 : 0;
     }
     if (meet)
-        store(out, left, top, right, bottom);
+        *out = makeRect(left, top, right, bottom);
     else
-        store(out, 0, 0, 0, 0);
+        *out = makeRect(0, 0, 0, 0);
     return meet ? 1 : 0;
 }
 
@@ -101,15 +90,15 @@ unsigned char EqualRect(const Rect* a, const Rect* b)
 {
     if (!a || !b)
         return (!a && !b) ? 1 : 0;
-    return (a->top == b->top && a->left == b->left && a->bottom == b->bottom && a->right == b->right)
-        ? 1 : 0;
+    return sameRect(*a, *b) ? 1 : 0;
 }
 
 void Pt2Rect(Point a, Point b, Rect* out)
 {
     if (!out)
         return;
-    store(out, std::min(a.h, b.h), std::min(a.v, b.v), std::max(a.h, b.h), std::max(a.v, b.v));
+    *out = makeRect(std::min(a.h, b.h), std::min(a.v, b.v), std::max(a.h, b.h),
+                    std::max(a.v, b.v));
 }
 
 } // namespace Velmar

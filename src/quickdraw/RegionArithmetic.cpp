@@ -65,14 +65,14 @@ void MapRgn(RgnHandle rgn, const Rect* src, const Rect* dst)
         Private::shapeWarning("warning: MapRgn: null rectangle");
         return;
     }
-    const int srcWidth = src->right - src->left, srcHeight = src->bottom - src->top;
+    const int srcWidth = Private::rectWidth(*src), srcHeight = Private::rectHeight(*src);
     if (srcWidth == 0 || srcHeight == 0) {
         // The map has no scale; the region is left as it was.
         Private::shapeWarning("warning: MapRgn: empty source rectangle");
         return;
     }
-    const double sx = double(dst->right - dst->left) / srcWidth;
-    const double sy = double(dst->bottom - dst->top) / srcHeight;
+    const double sx = double(Private::rectWidth(*dst)) / srcWidth;
+    const double sy = double(Private::rectHeight(*dst)) / srcHeight;
     const QTransform map(sx, 0, 0, sy, dst->left - src->left * sx, dst->top - src->top * sy);
     *rgn = map.map(*rgn);
 }
