@@ -63,6 +63,14 @@ inline QStringList& log()
     return sLog;
 }
 
+// Appends `entry` unless it repeats the last one: a run of calls then shows once, however
+// often the Qt loop spun.
+inline void noteOnce(QStringList& seen, const QString& entry)
+{
+    if (seen.isEmpty() || seen.last() != entry)
+        seen << entry;
+}
+
 inline QStringList assertsIn(const QStringList& entries)
 {
     return entries.filter(QStringLiteral("assert: "));
@@ -83,9 +91,11 @@ private:
     Velmar::AutomationListener* m_previous;
 };
 
-// Answers every assertion with "Ignore" and keeps the questions, for tests that count them.
-inline std::unique_ptr<VelmarTest::ScriptedAutomationListener> ignoreAssertions()
+// The start of a case that counts assertions: an empty log of what was seen, and a listener
+// that answers every assertion with "Ignore" and keeps the questions.
+inline std::unique_ptr<VelmarTest::ScriptedAutomationListener> startCase(QStringList& seen)
 {
+    seen.clear();
     return std::make_unique<VelmarTest::ScriptedAutomationListener>(QStringList{}, QStringLiteral("Ignore"));
 }
 

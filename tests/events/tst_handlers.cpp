@@ -90,8 +90,7 @@ class tst_Handlers : public QObject {
 private Q_SLOTS:
     void init()
     {
-        gSeen.clear();
-        m_listener = EventTest::ignoreAssertions();
+        m_listener = EventTest::startCase(gSeen);
     }
     void cleanup()
     {

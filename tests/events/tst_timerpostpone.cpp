@@ -1,6 +1,6 @@
 // Qt timers that fire while Carbon dispatch is blocked are held back by the application
 // object and re-posted once when the event loop timers resume.
-#include "TestSupport.h"
+#include "events_support.h"
 
 #include "events/EventDispatch.h"
 #include "events/EventQueue.h"
@@ -23,12 +23,6 @@ namespace {
 // What happened, in order; a run of the same entry shows once.
 QStringList gSeen;
 
-void note(const QString& entry)
-{
-    if (gSeen.isEmpty() || gSeen.last() != entry)
-        gSeen << entry;
-}
-
 // Logs its timer events and counts them.
 class Probe : public QObject {
 public:
@@ -39,7 +33,7 @@ protected:
     void timerEvent(QTimerEvent*) override
     {
         ++received;
-        note(m_name);
+        EventTest::noteOnce(gSeen, m_name);
     }
 
 private:
@@ -130,7 +124,7 @@ private Q_SLOTS:
     void eventLoopTimersUnderTheApplication()
     {
         EventLoopTimerRef timer = nullptr;
-        InstallEventLoopTimer(GetMainEventLoop(), 0, 0, [](EventLoopTimerRef, void*) { note("carbon"); }, nullptr, &timer);
+        InstallEventLoopTimer(GetMainEventLoop(), 0, 0, [](EventLoopTimerRef, void*) { EventTest::noteOnce(gSeen, "carbon"); }, nullptr, &timer);
         QTRY_VERIFY(!gSeen.isEmpty());
         {
             ScopedCarbonEventsBlocker blocker("timers");

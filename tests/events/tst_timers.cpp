@@ -26,7 +26,9 @@ QStringList gSeen;
 
 void note(const QString& entry)
 {
-    if (gSeen.isEmpty() || gSeen.last() != entry || !entry.startsWith(u'~'))
+    if (entry.startsWith(u'~'))
+        EventTest::noteOnce(gSeen, entry);
+    else
         gSeen << entry;
 }
 
@@ -71,8 +73,7 @@ class tst_Timers : public QObject {
 private Q_SLOTS:
     void init()
     {
-        gSeen.clear();
-        m_listener = EventTest::ignoreAssertions();
+        m_listener = EventTest::startCase(gSeen);
     }
     void cleanup()
     {
