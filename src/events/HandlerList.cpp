@@ -1,16 +1,14 @@
 #include "events/HandlerList.h"
 
+#include "events/EventMask.h"
+
 #include <algorithm>
 
 namespace Velmar::Private {
 
 bool EventHandler::handles(UInt32 eventClass, UInt32 eventKind) const
 {
-    if (types.isEmpty())
-        return true;
-    return std::any_of(types.cbegin(), types.cend(), [&](const EventTypeSpec& t) {
-        return t.eventClass == eventClass && t.eventKind == eventKind;
-    });
+    return MatchesEventTypes(types.constData(), UInt32(types.size()), eventClass, eventKind);
 }
 
 HandlerList& HandlerList::instance()
