@@ -48,7 +48,6 @@ void HandlerList::takeOut(std::size_t index)
         // A running chain may be inside this handler or hold a position past it.
         m_slots[index] = nullptr;
         m_retired.push_back(handler);
-        m_hasHoles = true;
     } else {
         m_slots.erase(m_slots.begin() + std::ptrdiff_t(index));
         delete handler;
@@ -82,13 +81,12 @@ int HandlerList::removeWindowHandlers(const AQtWindow* window)
 
 void HandlerList::endWalk()
 {
-    if (--m_walkers > 0 || !m_hasHoles)
+    if (--m_walkers > 0 || m_retired.empty())
         return;
     std::erase(m_slots, nullptr);
     for (EventHandler* handler : m_retired)
         delete handler;
     m_retired.clear();
-    m_hasHoles = false;
 }
 
 } // namespace Velmar::Private

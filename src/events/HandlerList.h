@@ -61,7 +61,6 @@ private:
     std::vector<EventHandler*> m_slots; // oldest first
     std::vector<EventHandler*> m_retired; // removed mid-walk, freed after it
     int m_walkers = 0;
-    bool m_hasHoles = false;
 };
 
 } // namespace Velmar::Private
