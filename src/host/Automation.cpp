@@ -1,26 +1,26 @@
 // The automation listener slot: empty unless a host or a test installs one.
 #include <Velmar/HostCore.h>
 
+#include "host/Replaceable.h"
+
 #include <QStringList>
 
 namespace Velmar {
 
 namespace {
-AutomationListener* gListener = nullptr;
+Private::Replaceable<AutomationListener*> gListener(nullptr);
 }
 
 AutomationListener::~AutomationListener() = default;
 
 AutomationListener* AutomationListenerManager::GetListener()
 {
-    return gListener;
+    return gListener.get();
 }
 
 AutomationListener* AutomationListenerManager::SetListener(AutomationListener* listener)
 {
-    AutomationListener* previous = gListener;
-    gListener = listener;
-    return previous;
+    return gListener.set(listener);
 }
 
 SInt32 AskAutomationListener(const QString& title, const QString& text, const QString& choices)
