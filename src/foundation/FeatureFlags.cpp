@@ -51,7 +51,8 @@ const FeatureFlagInfo& featureFlagInfo(FeatureFlag flag)
 UInt32 featureFlag(FeatureFlag flag, UInt32 newValue)
 {
     UInt32& cache = gFlagCache[std::size_t(flag)];
-    if (newValue == kFeatureFlagQuery && cache != kUnread)
+    // Known, and not changing: the settings store need not be opened.
+    if (cache != kUnread && (newValue == kFeatureFlagQuery || newValue == cache))
         return cache;
 
     const FeatureFlagInfo& info = featureFlagInfo(flag);
