@@ -14,6 +14,11 @@ Qt::CaseSensitivity sensitivity(Boolean caseSens)
     return caseSens ? Qt::CaseSensitive : Qt::CaseInsensitive;
 }
 
+int comparePascal(const unsigned char* a, const unsigned char* b, Qt::CaseSensitivity cs)
+{
+    return PascalString2QString(a).compare(PascalString2QString(b), cs);
+}
+
 // International resources are not supported; say so once per call and carry on without.
 void warnIntlParam(Handle intlParam, const char* call)
 {
@@ -51,30 +56,26 @@ void StringToNum(const unsigned char* s, SInt32* out)
 Boolean EqualString(const unsigned char* a, const unsigned char* b, Boolean caseSens,
                     Boolean /*diacSens: accents always count*/)
 {
-    return PascalString2QString(a).compare(PascalString2QString(b), sensitivity(caseSens)) == 0
-        ? 1 : 0;
+    return comparePascal(a, b, sensitivity(caseSens)) == 0 ? 1 : 0;
 }
 
 SInt16 RelString(const unsigned char* a, const unsigned char* b, Boolean caseSens,
                  Boolean /*diacSens*/)
 {
     // Deliberately QString's own value, not clamped: callers only look at the sign.
-    return static_cast<SInt16>(
-        PascalString2QString(a).compare(PascalString2QString(b), sensitivity(caseSens)));
+    return static_cast<SInt16>(comparePascal(a, b, sensitivity(caseSens)));
 }
 
 SInt16 CompareString(const unsigned char* a, const unsigned char* b, Handle intlParam)
 {
     warnIntlParam(intlParam, "CompareString");
-    return static_cast<SInt16>(
-        PascalString2QString(a).compare(PascalString2QString(b), Qt::CaseSensitive));
+    return static_cast<SInt16>(comparePascal(a, b, Qt::CaseSensitive));
 }
 
 SInt16 IdenticalString(const unsigned char* a, const unsigned char* b, Handle intlParam)
 {
     warnIntlParam(intlParam, "IdenticalString");
-    return PascalString2QString(a).compare(PascalString2QString(b), Qt::CaseSensitive) == 0
-        ? 0 : 1;
+    return comparePascal(a, b, Qt::CaseSensitive) == 0 ? 0 : 1;
 }
 
 SInt16 IdenticalText(const void* a, const void* b, SInt16 aLen, SInt16 bLen, Handle intlParam)
