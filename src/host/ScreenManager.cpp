@@ -12,20 +12,22 @@ namespace Velmar {
 
 namespace {
 
+bool haveGuiApplication()
+{
+    return qobject_cast<QGuiApplication*>(QCoreApplication::instance()) != nullptr;
+}
+
 QScreen* screenAt(SInt32 screen)
 {
-    if (!qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
+    if (!haveGuiApplication())
         return nullptr;
     const QList<QScreen*> screens = QGuiApplication::screens();
     return (screen >= 0 && screen < screens.size()) ? screens.at(screen) : nullptr;
 }
 
-// What a one-menu menu bar measures in the current style; 20, the classic height, without
-// a widget application to ask.
+// What a one-menu menu bar measures in the current style; needs a widget application.
 SInt16 styledMenuBarHeight()
 {
-    if (!qobject_cast<QApplication*>(QCoreApplication::instance()))
-        return 20;
     QMenuBar probe;
     probe.addMenu(QStringLiteral("File"));
     return SInt16(probe.sizeHint().height());
@@ -37,15 +39,13 @@ AScreenManOS::~AScreenManOS() = default;
 
 SInt32 AScreenManOS::GetCurrentScreen() const
 {
-    QScreen* primary = qobject_cast<QGuiApplication*>(QCoreApplication::instance())
-                           ? QGuiApplication::primaryScreen() : nullptr;
+    QScreen* primary = haveGuiApplication() ? QGuiApplication::primaryScreen() : nullptr;
     return primary ? SInt32(QGuiApplication::screens().indexOf(primary)) : -1;
 }
 
 SInt32 AScreenManOS::GetScreenCount() const
 {
-    return qobject_cast<QGuiApplication*>(QCoreApplication::instance())
-               ? SInt32(QGuiApplication::screens().size()) : 0;
+    return haveGuiApplication() ? SInt32(QGuiApplication::screens().size()) : 0;
 }
 
 SInt32 AScreenManOS::GetScreenForPoint(const QPoint& globalPoint) const
@@ -76,10 +76,10 @@ SInt16 AScreenManOS::GetMenuBarHeight(SInt32 screen) const
     static SInt16 measured = 0; // measured once a widget application exists
     if (measured > 0)
         return measured;
-    const SInt16 height = styledMenuBarHeight();
-    if (qobject_cast<QApplication*>(QCoreApplication::instance()))
-        measured = height;
-    return height;
+    if (!qobject_cast<QApplication*>(QCoreApplication::instance()))
+        return 20; // the classic height, without a widget application to ask
+    measured = styledMenuBarHeight();
+    return measured;
 }
 
 QRect AScreenManOS::GetScreenRect(SInt32 screen) const
