@@ -13,6 +13,7 @@
 #include <QTimerEvent>
 
 #include <exception>
+#include <utility>
 
 namespace Velmar {
 
@@ -129,18 +130,19 @@ bool AQtApplication::filterAndDeliver(QObject* receiver, QEvent* e)
 
 void AQtApplication::postponeTimer(QObject* receiver, int timerId)
 {
-    if (d->postponedTimerIds.contains(timerId))
-        return;
-    d->postponedTimerIds.insert(timerId);
+    // Few timers fire while events are blocked: a scan is cheaper than keeping an index.
+    for (const Private::PostponedTimer& timer : std::as_const(d->postponedTimers)) {
+        if (timer.timerId == timerId)
+            return;
+    }
     d->postponedTimers.append({QPointer<QObject>(receiver), timerId});
 }
 
 void AQtApplication::DispatchPostponedTimers()
 {
-    // Taken first: posting may run nothing now, but the lists must be empty afterwards
+    // Taken first: posting may run nothing now, but the list must be empty afterwards
     // even if a receiver is blocked again before the posted events arrive.
     const QList<Private::PostponedTimer> timers = std::exchange(d->postponedTimers, {});
-    d->postponedTimerIds.clear();
     for (const Private::PostponedTimer& timer : timers) {
         if (timer.receiver)
             QCoreApplication::postEvent(timer.receiver, new QTimerEvent(timer.timerId));

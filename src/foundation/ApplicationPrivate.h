@@ -6,7 +6,6 @@
 #include <QAbstractNativeEventFilter>
 #include <QList>
 #include <QPointer>
-#include <QSet>
 
 class QMenuBar;
 
@@ -28,8 +27,7 @@ struct AQtApplicationPrivate {
     bool decorationFlag = false;
     QMenuBar* menuBar = nullptr;                           // owned
     Brindle::DecorationManager* decorationManager = nullptr; // owned until ShutdownApp
-    QSet<int> postponedTimerIds;
-    QList<PostponedTimer> postponedTimers; // arrival order
+    QList<PostponedTimer> postponedTimers; // arrival order, one entry per timer id
     bool applicationActive = false;
 };
 
