@@ -45,6 +45,12 @@ bool isWidgetWindowRelay(const QObject* receiver)
     return receiver->isWindowType() && receiver->inherits("QWidgetWindow");
 }
 
+void logResultCodeException(qlonglong code)
+{
+    qCritical("%s", qPrintable(QStringLiteral("Unhandled result code exception (%1)!")
+                                   .arg(QString::number(code, 16))));
+}
+
 } // namespace
 
 namespace Private {
@@ -57,11 +63,9 @@ void logCurrentNotifyException()
     } catch (const char* text) {
         qCritical("%s", text ? text : "NULL char* caught!");
     } catch (SInt32 code) {
-        qCritical("%s", qPrintable(QStringLiteral("Unhandled result code exception (%1)!")
-                                       .arg(QString::number(code, 16))));
+        logResultCodeException(code);
     } catch (long code) { // a Toolbox result code thrown as a C long
-        qCritical("%s", qPrintable(QStringLiteral("Unhandled result code exception (%1)!")
-                                       .arg(QString::number(code, 16))));
+        logResultCodeException(code);
     } catch (const XError& error) {
         qCritical("%s", qPrintable(QStringLiteral("   Error: %1 Line: %2 File: %3")
                                        .arg(QString::fromLocal8Bit(error.GetErrorMessage()),
