@@ -29,25 +29,28 @@ inline bool isRecording(const QtGrafPort* port)
     return port && (port->definingPoly || port->definingRgn);
 }
 
+// A port's cached brush while its ink is unchanged, else `resolve(port)` (which refills it).
+inline const QBrush& cachedBrush(QtGrafPort* port, const QtGrafPort::BrushCache& cache,
+                                 const QBrush& (*resolve)(QtGrafPort*))
+{
+    if (cache.valid && cache.serial == port->inkSerial)
+        return cache.result;
+    return resolve(port);
+}
+
 // The brush Paint and Fill operations use: the pen pattern in the foreground colour, on the
 // back colour (or transparent paper under patOr). The reference stays valid until the next
 // call for the same port.
 const QBrush& resolveFillBrush(QtGrafPort* port);
 inline const QBrush& resolvedFillBrush(QtGrafPort* port)
 {
-    const QtGrafPort::BrushCache& cache = port->fillCache;
-    if (cache.valid && cache.serial == port->inkSerial)
-        return cache.result;
-    return resolveFillBrush(port);
+    return cachedBrush(port, port->fillCache, resolveFillBrush);
 }
 // The brush Erase operations and ScrollRect use: the background pattern in the back colour.
 const QBrush& resolveBackgroundBrush(QtGrafPort* port);
 inline const QBrush& resolvedBackgroundBrush(QtGrafPort* port)
 {
-    const QtGrafPort::BrushCache& cache = port->backCache;
-    if (cache.valid && cache.serial == port->inkSerial)
-        return cache.result;
-    return resolveBackgroundBrush(port);
+    return cachedBrush(port, port->backCache, resolveBackgroundBrush);
 }
 // A given pattern resolved like the fill brush (FillRect and friends).
 QBrush resolvedPatternBrush(QtGrafPort* port, const QBrush& pattern);
