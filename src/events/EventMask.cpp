@@ -52,6 +52,19 @@ int ParseEventMask(UInt16 mask, EventTypeList& out)
     return int(out.count);
 }
 
+bool ClassicEventType(UInt16 eventCode, EventTypeSpec& out)
+{
+    if (eventCode < 1 || eventCode > 6)
+        return false;
+    for (const MaskRow& row : kMaskRows) {
+        if (row.bit == (1u << eventCode)) {
+            out = EventTypeSpec{row.eventClass, row.eventKind};
+            return true;
+        }
+    }
+    return false;
+}
+
 bool MatchesEventTypes(const EventTypeSpec* list, UInt32 count, UInt32 eventClass, UInt32 eventKind)
 {
     if (count == 0 || !list)

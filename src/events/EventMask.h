@@ -20,6 +20,10 @@ struct EventTypeList {
 // when not a single bit of a non-zero mask is known.
 int ParseEventMask(UInt16 mask, EventTypeList& out);
 
+// Classic event codes 1 to 6 (mouseDown to updateEvt) have one Carbon (class, kind) pair;
+// false for every other code, which has no Carbon form.
+bool ClassicEventType(UInt16 eventCode, EventTypeSpec& out);
+
 // An empty list matches every event.
 bool MatchesEventTypes(const EventTypeSpec* list, UInt32 count, UInt32 eventClass, UInt32 eventKind);
 bool MatchesEventTypes(const EventTypeSpec* list, UInt32 count, const EventQueueItem* item);

@@ -86,17 +86,10 @@ OSErr PostEvent(UInt16 eventCode, UInt32 eventMsg)
     FillNullEvent(item.get());
 
     // Codes 1 to 6 have a Carbon form; everything else travels as a 'vlme' event.
-    if (eventCode < 7) {
-        EventTypeList pairs;
-        if (ParseEventMask(UInt16(1u << eventCode), pairs) == 1) {
-            item->eventClass = pairs.specs[0].eventClass;
-            item->eventKind = pairs.specs[0].eventKind;
-        }
-    }
-    if (item->isNullEvent()) {
-        item->eventClass = kEventClassVelmarClassic;
-        item->eventKind = eventCode;
-    }
+    EventTypeSpec type{kEventClassVelmarClassic, eventCode};
+    ClassicEventType(eventCode, type);
+    item->eventClass = type.eventClass;
+    item->eventKind = type.eventKind;
     item->message = eventMsg;
     ScheduleEvent(item, EventQueueItem::NoMerge);
     return noErr;
