@@ -92,8 +92,7 @@ void EventQueue::RaiseQueueChangedSignal()
 
 void EventQueue::CallbackQueueChangeEventRemoved()
 {
-    if (!m_hasQueueChangeEvent)
-        velmar_assert("m_hasQueueChangeEvent", __FILE__, __LINE__, __func__, "m_hasQueueChangeEvent");
+    VELMAR_ASSERT(m_hasQueueChangeEvent, "m_hasQueueChangeEvent");
     m_hasQueueChangeEvent = false;
 }
 

@@ -45,8 +45,7 @@ EventQueueItem::EventQueueItem(const EventQueueItem& other)
 
 EventQueueItem::~EventQueueItem()
 {
-    if (refCount != 0)
-        velmar_assert("refCount == 0", __FILE__, __LINE__, __func__, "refCount == 0");
+    VELMAR_ASSERT(refCount == 0, "refCount == 0");
     --sLiveCount;
 }
 
@@ -139,12 +138,8 @@ void EventQueueItem::Merge(const EventQueueItem* other)
 {
     if (!other)
         return;
-    if (eventClass != other->eventClass)
-        velmar_assert("eventClass == other->eventClass", __FILE__, __LINE__, __func__,
-                      "eventClass == other->eventClass");
-    if (eventKind != other->eventKind)
-        velmar_assert("eventKind == other->eventKind", __FILE__, __LINE__, __func__,
-                      "eventKind == other->eventKind");
+    VELMAR_ASSERT(eventClass == other->eventClass, "eventClass == other->eventClass");
+    VELMAR_ASSERT(eventKind == other->eventKind, "eventKind == other->eventKind");
     if (other->skipFlush)
         skipFlush = 1;
 }
