@@ -1,5 +1,5 @@
 // What drawing calls use: the painter of a port, the resolved fill and background brushes,
-// the pen-mode to composition-mode table, and the recording test.
+// and the pen-mode to composition-mode table.
 #pragma once
 
 #include <Velmar/QtGrafPort.h>
@@ -20,13 +20,6 @@ inline QPainter* portPainter(QtGrafPort* port, const char* caller)
     if (port && port->isActive())
         return port->painter;
     return startPortPainter(port, caller);
-}
-
-// True while the port records MoveTo/LineTo or frame calls into a polygon or region:
-// drawing calls then record instead of drawing.
-inline bool isRecording(const QtGrafPort* port)
-{
-    return port && (port->definingPoly || port->definingRgn);
 }
 
 // A port's cached brush while its ink is unchanged, else `resolve(port)` (which refills it).
