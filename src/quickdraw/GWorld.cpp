@@ -32,7 +32,7 @@ const BitMapPtr& emptyBitMap()
 SInt16 NewGWorld(GrafPtr* out, SInt16 depth, const Rect* bounds, void* /*colorTable*/,
                  void* /*device*/, UInt32 /*flags*/)
 {
-    QRect rect = toQRect(bounds);
+    QRect rect = worldRect(bounds, depth);
     if (rect.width() == 0 && rect.height() == 0) {
         rect.setWidth(1);
         rect.setHeight(1);
@@ -40,8 +40,6 @@ SInt16 NewGWorld(GrafPtr* out, SInt16 depth, const Rect* bounds, void* /*colorTa
     if (rect.width() < 1 || rect.height() < 1)
         VelmarLog(kLogGrafPort, "NewGWorld: empty bounds %dx%d made at least one pixel",
                   rect.width(), rect.height());
-    if (depth == 0)
-        rect.moveTopLeft(QPoint(0, 0));
     if (!out) {
         VelmarLog(kLogGrafPort, "NewGWorld: no place to store the world");
         return 0;
