@@ -3,21 +3,13 @@
 #include <Velmar/QuickDraw.h>
 
 #include "quickdraw/PortPainter.h"
+#include "quickdraw/ShapeLog.h"
 
 namespace Velmar {
 
 using namespace Private;
 
 namespace {
-
-// The current port, or null after logging `warning` (a fixed text).
-QtGrafPort* portOrWarn(const char* warning)
-{
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port)
-        warnNoPort(warning);
-    return port;
-}
 
 void applyPenMode(QtGrafPort* port, SInt16 mode)
 {
@@ -30,21 +22,21 @@ void applyPenMode(QtGrafPort* port, SInt16 mode)
 
 void PenPat(const PatPtr& pattern)
 {
-    QtGrafPort* port = portOrWarn("warning: PenPat: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: PenPat: Can't get current port !");
     if (port && pattern.brush())
         port->setBrush(*pattern.brush());
 }
 
 void BackPat(const PatPtr& pattern)
 {
-    QtGrafPort* port = portOrWarn("warning: BackPat: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: BackPat: Can't get current port !");
     if (port && pattern.brush())
         port->setBackground(*pattern.brush());
 }
 
 void PenSize(SInt16 width, SInt16 height)
 {
-    QtGrafPort* port = portOrWarn("warning: PenSize: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: PenSize: Can't get current port !");
     if (!port)
         return;
     const QPen& current = port->currentPen();
@@ -66,14 +58,14 @@ void PenSize(SInt16 width, SInt16 height)
 
 void PenMode(SInt16 mode)
 {
-    QtGrafPort* port = portOrWarn("warning: PenMode: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: PenMode: Can't get current port !");
     if (port)
         applyPenMode(port, mode);
 }
 
 void PenNormal()
 {
-    QtGrafPort* port = portOrWarn("warning: PenNormal: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: PenNormal: Can't get current port !");
     if (!port)
         return;
     applyPenMode(port, patCopy);
@@ -84,7 +76,7 @@ void PenNormal()
 
 void HidePen()
 {
-    QtGrafPort* port = portOrWarn("warning: HidePen: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: HidePen: Can't get current port !");
     if (!port)
         return;
     if (port->penVisibility-- == 0) {
@@ -97,7 +89,7 @@ void HidePen()
 
 void ShowPen()
 {
-    QtGrafPort* port = portOrWarn("warning: ShowPen: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: ShowPen: Can't get current port !");
     if (!port)
         return;
     if (++port->penVisibility == 0) {
@@ -110,7 +102,7 @@ void ShowPen()
 
 void GetPen(Point* location)
 {
-    QtGrafPort* port = portOrWarn("warning: GetPen: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: GetPen: Can't get current port !");
     if (!port || !location)
         return;
     location->v = static_cast<SInt16>(port->penY);
@@ -119,7 +111,7 @@ void GetPen(Point* location)
 
 void SetPenStyle(int style)
 {
-    QtGrafPort* port = portOrWarn("warning: SetPenStyle: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: SetPenStyle: Can't get current port !");
     if (!port)
         return;
     QPen pen = port->currentPen();
@@ -129,13 +121,13 @@ void SetPenStyle(int style)
 
 int GetPenStyle()
 {
-    QtGrafPort* port = portOrWarn("warning: GetPenStyle: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: GetPenStyle: Can't get current port !");
     return port ? static_cast<int>(port->currentPen().style()) : static_cast<int>(Qt::SolidLine);
 }
 
 void GetPenState(PenState* state)
 {
-    QtGrafPort* port = portOrWarn("warning: GetPenState: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: GetPenState: Can't get current port !");
     if (!port || !state)
         return;
     state->setPenLocation(QPoint(port->penX, port->penY));
@@ -146,7 +138,7 @@ void GetPenState(PenState* state)
 
 void SetPenState(const PenState* state)
 {
-    QtGrafPort* port = portOrWarn("warning: SetPenState: Can't get current port !");
+    QtGrafPort* port = shapePort("warning: SetPenState: Can't get current port !");
     if (!port || !state)
         return;
     port->penX = state->penLocation().x();
