@@ -91,7 +91,7 @@ void DrawLinesFromPointPairs(const QList<QPoint>& points)
 
 void DrawPolylineFromPoints(const QList<QPoint>& points)
 {
-    if (!shapePort("warning: DrawLinesFromPointPairs: cannot get Qt port") || points.isEmpty())
+    if (!shapePort("warning: DrawPolylineFromPoints: cannot get Qt port") || points.isEmpty())
         return;
     const QRect bounds = QPolygon(points).boundingRect();
     strokeShape("DrawPolylineFromPoints", bounds, [&points](QPainter* p) {
