@@ -26,7 +26,11 @@ struct VELMAR_EXPORT EventTargetRef {
     UInt32 targetType = 0;
     AQtWindow* window = nullptr; // only for window targets
 
-    bool operator==(const EventTargetRef& other) const = default;
+    bool operator==(const EventTargetRef& other) const
+    {
+        return targetType == other.targetType && window == other.window;
+    }
+    bool operator!=(const EventTargetRef& other) const { return !(*this == other); }
 };
 
 using EventHandlerRef = Private::EventHandler*;

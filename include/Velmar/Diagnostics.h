@@ -44,11 +44,20 @@ VELMAR_EXPORT void StartLoggingStackCalls();
 using DebugOutputHook = void (*)(const char* line, void* context);
 VELMAR_EXPORT void SetDebugOutputHook(DebugOutputHook hook, void* context);
 
+// What VELMAR_ASSERT expands to: raises the assertion `text` when `ok` is false, and gives `ok`
+// back so that a call can go on to its error result.
+inline bool velmar_check(bool ok, const char* text, const char* file, int line,
+                         const char* function)
+{
+    if (!ok)
+        velmar_assert(text, file, line, function, nullptr);
+    return ok;
+}
+
 } // namespace Velmar
 
-// Evaluates the condition; on failure calls velmar_assert with the caller's location.
-#define VELMAR_ASSERT(cond, message)                                                        \
-    do {                                                                                    \
-        if (!(cond))                                                                        \
-            ::Velmar::velmar_assert(#cond, __FILE__, __LINE__, __func__, (message));        \
-    } while (0)
+// The one way the library asserts. `text` is what the dialog and the log show after
+// "velmar_assert: " (the documented assertion text, which need not be the C++ condition).
+// Evaluates to the condition: `if (!VELMAR_ASSERT(port, "port != NULL")) return paramErr;`
+#define VELMAR_ASSERT(cond, text)                                                           \
+    ::Velmar::velmar_check(static_cast<bool>(cond), (text), __FILE__, __LINE__, __func__)

@@ -14,7 +14,6 @@
 #include <QRegion>
 #include <QTransform>
 
-#include <memory>
 
 class QImage;
 class QPaintDevice;
@@ -73,8 +72,14 @@ private:
     SInt16 m_pixelDepth;
 };
 
+namespace Private {
+struct QtGrafPortPrivate;
+}
+
 // A graphics port: a window's port (window set; its image is the window's back buffer)
-// or an offscreen world (no window; it exists only as its image).
+// or an offscreen world (no window; it exists only as its image). The public fields are the
+// port record hosts and the other managers read; caches and painter bookkeeping live in a
+// private record.
 class VELMAR_EXPORT QtGrafPort {
 public:
     static constexpr UInt32 kLiveMagic = 0x51744750; // "PGtQ"
@@ -120,34 +125,25 @@ public:
     UInt32 magic = kLiveMagic;
     UInt8 appFontFlag = 1;
     UInt8 clipInForce = 0;
-    // The pen as it was when HidePen hid it.
-    QPen savedPen;
 
     // ---- Painter --------------------------------------------------------------------
-    bool isActive() const { return m_painterActive; }
+    bool isActive() const;
     // Starts the painter on the paint device or the image; ends the oldest active painter
     // when more than 50 would be active.
     void BeginPaint();
     void EndPaint();
 
-    QImage* image() const { return m_image.get(); }
+    // The pixels (null in direct drawing mode, or for a world too large to allocate).
+    QImage* image() const;
     // The origin (local coordinates of the image's top-left pixel).
     QPoint origin() const { return bounds.topLeft(); }
 
     // ---- State that lives in the painter while it is active --------------------------
-    const QPen& currentPen() const { return m_painterActive ? painter->pen() : painterState.pen; }
-    const QBrush& currentBrush() const
-    {
-        return m_painterActive ? painter->brush() : painterState.brush;
-    }
-    const QBrush& currentBackground() const
-    {
-        return m_painterActive ? painter->background() : painterState.background;
-    }
-    QPainter::CompositionMode currentCompositionMode() const
-    {
-        return m_painterActive ? painter->compositionMode() : painterState.compositionMode;
-    }
+    const QPen& currentPen() const;
+    const QBrush& currentBrush() const;
+    const QBrush& currentBackground() const;
+    QPainter::CompositionMode currentCompositionMode() const;
+    const QFont& currentFont() const;
     QColor foreColor() const { return currentPen().color(); }
     void setPen(const QPen& pen);
     void setForeColor(const QColor& color);
@@ -155,10 +151,6 @@ public:
     void setBackground(const QBrush& brush);
     void setCompositionMode(QPainter::CompositionMode mode);
     void setFont(const QFont& font);
-    const QFont& currentFont() const
-    {
-        return m_painterActive ? painter->font() : painterState.font;
-    }
 
     // ---- Geometry and clip ------------------------------------------------------------
     // Resizes the port (image reallocated, offscreen content kept at the top-left).
@@ -175,35 +167,14 @@ public:
             markWindowDirty(localRect);
     }
 
-    // Bumped by every setter above and by BeginPaint/EndPaint, and by RGBBackColor and the
-    // pen mode: the resolved brushes below are reused while it is unchanged. Code that
-    // changes the painter's pen or brush directly and leaves it changed must call inkChanged().
-    UInt32 inkSerial = 0;
-    void inkChanged() { ++inkSerial; }
-
-    // Last resolved fill and background brushes, so that repeated drawing with the same
-    // pattern and colours builds nothing. A cache, not state.
-    struct BrushCache {
-        UInt32 serial = 0;
-        bool valid = false;
-        QBrush source;
-        QRgb ink = 0;
-        QRgb paper = 0;
-        bool transparentPaper = false;
-        QBrush result;
-    };
-    BrushCache fillCache;
-    BrushCache backCache;
-
 private:
     void init(const QRect& rect, SInt16 pixelDepth);
     void applyOrigin();
     void markWindowDirty(const QRect& localRect);
     bool allocateImage(const QSize& size);
 
-    std::unique_ptr<QImage> m_image;
-    bool m_painterActive = false;
-    friend class BitMapPtr;
+    Private::QtGrafPortPrivate* d;
+    friend struct Private::QtGrafPortPrivate;
 };
 
 // Scoped access to the current (or a given) port's painter. The destructor reports the
@@ -249,13 +220,15 @@ class VELMAR_EXPORT SavePortVisibleRegion {
 public:
     SavePortVisibleRegion();
     ~SavePortVisibleRegion();
-    SavePortVisibleRegion(const SavePortVisibleRegion&) = default;
-    SavePortVisibleRegion& operator=(const SavePortVisibleRegion&) = default;
+    SavePortVisibleRegion(const SavePortVisibleRegion& other);
+    SavePortVisibleRegion& operator=(const SavePortVisibleRegion& other);
 
     RgnHandle visible() { return &m_visible; }
     RgnHandle clip() { return &m_clip; }
 
 private:
+    void lendRegions();
+
     GrafPtr m_port;
     QRegion m_visible;
     QRegion m_clip;

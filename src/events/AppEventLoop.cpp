@@ -1,5 +1,7 @@
 #include "events/AppEventLoop.h"
 
+#include "host/Replaceable.h"
+
 #include <Velmar/CarbonEventHandlers.h>
 
 #include <QCoreApplication>
@@ -8,15 +10,13 @@ namespace Velmar {
 
 namespace {
 
-Private::ApplicationLoopProbe gApplicationLoopProbe = nullptr;
+Private::Replaceable<Private::ApplicationLoopProbe> gApplicationLoopProbe(nullptr);
 
 } // namespace
 
 Private::ApplicationLoopProbe Private::SetApplicationLoopProbe(ApplicationLoopProbe probe)
 {
-    ApplicationLoopProbe old = gApplicationLoopProbe;
-    gApplicationLoopProbe = probe;
-    return old;
+    return gApplicationLoopProbe.set(probe);
 }
 
 void QuitApplicationEventLoop()
@@ -26,7 +26,8 @@ void QuitApplicationEventLoop()
 
 bool InApplicationEventLoop()
 {
-    return gApplicationLoopProbe && gApplicationLoopProbe();
+    const Private::ApplicationLoopProbe probe = gApplicationLoopProbe.get();
+    return probe && probe();
 }
 
 } // namespace Velmar

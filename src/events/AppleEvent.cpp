@@ -1,26 +1,23 @@
 // Apple events have no counterpart here; the calls report themselves and fail.
 #include <Velmar/CarbonEventHandlers.h>
-#include <Velmar/Diagnostics.h>
-#include <Velmar/MacErrors.h>
+
+#include "foundation/NotImplemented.h"
 
 namespace Velmar {
 
 OSStatus AEProcessAppleEvent(const EventRecord* /*theEventRecord*/)
 {
-    VelmarLog(kLogNotImpl, "Velmar::AEProcessAppleEvent");
-    return unimpErr;
+    return Private::notImplemented("AEProcessAppleEvent");
 }
 
 OSStatus AEInstallEventHandler(AEEventClass, AEEventID, AEEventHandlerUPP, void*, Boolean)
 {
-    VelmarLog(kLogNotImpl, "Velmar::AEInstallEventHandler");
-    return unimpErr;
+    return Private::notImplemented("AEInstallEventHandler");
 }
 
 OSStatus SendTextInputEvent(EventRef /*inEvent*/)
 {
-    VelmarLog(kLogNotImpl, "Velmar::SendTextInputEvent");
-    return unimpErr;
+    return Private::notImplemented("SendTextInputEvent");
 }
 
 } // namespace Velmar

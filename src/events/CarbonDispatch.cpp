@@ -15,9 +15,8 @@ namespace Private {
 
 bool DispatchEventToCallbacks(const EventQueueItemSmartPtr& item)
 {
-    if (gMainEventQueue.CheckCarbonEventsDisabled())
-        velmar_assert("!gMainEventQueue.CheckCarbonEventsDisabled()", __FILE__, __LINE__, __func__,
-                      "Carbon event dispatch while Carbon events are disabled");
+    VELMAR_ASSERT(!gMainEventQueue.CheckCarbonEventsDisabled(),
+                  "!gMainEventQueue.CheckCarbonEventsDisabled()");
     if (!item)
         return false;
 
@@ -52,7 +51,7 @@ bool DispatchEventToCallbacks(const EventQueueItemSmartPtr& item)
 
 OSStatus SendEventToEventTarget(EventRef inEvent, EventTargetRef /*inTarget*/)
 {
-    if (!inEvent)
+    if (!inEvent || !VELMAR_CHECK_EVENT(inEvent))
         return eventInternalErr;
     Private::DispatchEventToCallbacks(Private::EventQueueItemSmartPtr(inEvent));
     return noErr;

@@ -19,6 +19,10 @@ ScopedCarbonEventsBlocker::ScopedCarbonEventsBlocker(EventQueueRef queue, const 
                   name ? name : "");
         return;
     }
+    if (!VELMAR_CHECK_QUEUE(m_queue)) {
+        m_queue = nullptr;
+        return;
+    }
     block();
 }
 
@@ -30,7 +34,7 @@ ScopedCarbonEventsBlocker::~ScopedCarbonEventsBlocker()
 
 void ScopedCarbonEventsBlocker::block()
 {
-    VELMAR_ASSERT(!m_blocked, "ScopedCarbonEventsBlocker: already blocked");
+    VELMAR_ASSERT(!m_blocked, "!m_blocked");
     m_blocked = true;
     m_wasDisabled = m_queue->CheckCarbonEventsDisabled();
     m_queue->SetCarbonEventsDisabled(true);
@@ -40,8 +44,7 @@ void ScopedCarbonEventsBlocker::block()
 
 void ScopedCarbonEventsBlocker::Unblock()
 {
-    VELMAR_ASSERT(m_blocked, "ScopedCarbonEventsBlocker::Unblock: not blocked");
-    if (!m_blocked)
+    if (!VELMAR_ASSERT(m_blocked, "m_blocked"))
         return;
     m_blocked = false;
     const bool wasDisabled = m_queue->CheckCarbonEventsDisabled();

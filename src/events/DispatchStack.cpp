@@ -26,9 +26,7 @@ void PopDispatchedItem(const EventQueueItem* item)
     auto& s = stack();
     for (auto it = s.rbegin(); it != s.rend(); ++it) {
         if (it->get() == item) {
-            if (it != s.rbegin())
-                velmar_assert("DispatchStack().back() == item", __FILE__, __LINE__, __func__,
-                              "dispatch stack popped out of order");
+            VELMAR_ASSERT(it == s.rbegin(), "DispatchStack().back() == item");
             EventQueueItemSmartPtr keep = std::move(*it);
             s.erase(std::next(it).base());
             return;

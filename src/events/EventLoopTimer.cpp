@@ -2,6 +2,7 @@
 
 #include "events/EventQueue.h"
 #include "events/TimerRegistry.h"
+#include "host/Replaceable.h"
 
 #include <QCoreApplication>
 #include <QDeadlineTimer>
@@ -11,7 +12,7 @@ namespace Velmar::Private {
 
 namespace {
 
-RepaintDirtyPortsHook gRepaintDirtyPorts = nullptr;
+Replaceable<RepaintDirtyPortsHook> gRepaintDirtyPorts(nullptr);
 
 qint64 monotonicMs()
 {
@@ -25,9 +26,9 @@ QString callbackText(VelmarEventLoopTimer::Callback callback)
 
 } // namespace
 
-void SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook)
+RepaintDirtyPortsHook SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook)
 {
-    gRepaintDirtyPorts = hook;
+    return gRepaintDirtyPorts.set(hook);
 }
 
 VelmarEventLoopTimer::VelmarEventLoopTimer(Callback callback, void* userData, int intervalMs)
@@ -108,8 +109,8 @@ void VelmarEventLoopTimer::timerEvent(QTimerEvent* event)
     m_callback(this, m_userData);
     m_firing = false;
 
-    if (gRepaintDirtyPorts)
-        gRepaintDirtyPorts(0);
+    if (RepaintDirtyPortsHook repaint = gRepaintDirtyPorts.get())
+        repaint(0);
     MainTimerRegistry().resume();
 }
 

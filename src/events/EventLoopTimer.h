@@ -52,8 +52,8 @@ private:
 };
 
 // The windows layer sets this to repaint dirty ports after a timer procedure ran; until
-// then timers draw nothing by themselves.
+// then timers draw nothing by themselves. Returns the hook it replaces.
 using RepaintDirtyPortsHook = void (*)(int flags);
-void SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook);
+RepaintDirtyPortsHook SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook);
 
 } // namespace Velmar::Private

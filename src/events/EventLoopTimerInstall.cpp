@@ -38,9 +38,9 @@ OSStatus InstallEventLoopTimer(EventLoopRef inEventLoop, EventTimerInterval inFi
 {
     if (!inEventLoop)
         return eventInternalErr;
-    if (inEventLoop != Private::MainEventQueue())
-        velmar_assert("inEventLoop == Private::MainEventQueue()", __FILE__, __LINE__, __func__,
-                      "InstallEventLoopTimer: not the main event loop");
+    // The timer runs on the one loop even when the reference named another.
+    VELMAR_ASSERT(inEventLoop == Private::MainEventQueue(),
+                  "inEventLoop == Private::MainEventQueue()");
     if (differ(inFireDelay, inInterval))
         VelmarLog(kLogNotImpl, "InstallEventLoopTimer: inFireDelay != inInterval");
     if (!inTimerProc)

@@ -67,7 +67,7 @@ OSStatus GetEventParameter(EventRef event, EventParamName name, EventParamType d
                            EventParamType* outActualType, ByteCount bufferSize,
                            ByteCount* outActualSize, void* outData)
 {
-    if (!event)
+    if (!event || !VELMAR_CHECK_EVENT(event))
         return paramErr;
     if (outData)
         std::memset(outData, 0, bufferSize);
@@ -99,19 +99,13 @@ OSStatus GetEventParameter(EventRef event, EventParamName name, EventParamType d
 OSStatus SetEventParameter(EventRef event, EventParamName name, EventParamType type, ByteCount size,
                            const void* data)
 {
-    if (!event)
+    if (!event || !VELMAR_CHECK_EVENT(event))
         return eventInternalErr;
     const EventParameter* p = findParameter(name);
-    if (!p) {
-        velmar_assert("false", __FILE__, __LINE__, __func__, "false");
+    if (!VELMAR_ASSERT(p, "false"))
         return unimpErr;
-    }
-    if (p->type != type)
-        velmar_assert("kEventParameterList[idx].type == inType", __FILE__, __LINE__, __func__,
-                      "kEventParameterList[idx].type == inType");
-    if (p->size != size)
-        velmar_assert("kEventParameterList[idx].size == inSize", __FILE__, __LINE__, __func__,
-                      "kEventParameterList[idx].size == inSize");
+    VELMAR_ASSERT(p->type == type, "kEventParameterList[idx].type == inType");
+    VELMAR_ASSERT(p->size == size, "kEventParameterList[idx].size == inSize");
     if (!data) {
         VelmarLog(kLogEvents, "SetEventParameter: no data for parameter");
         return paramErr;

@@ -7,6 +7,8 @@
 
 #include <QCoreApplication>
 
+#include <algorithm>
+
 namespace Velmar {
 
 namespace Private {
@@ -32,6 +34,7 @@ void EventQueue::append(const EventQueueItemSmartPtr& item)
     if (!item)
         return;
     m_items.push_back(item);
+    ++m_changes;
     RaiseQueueChangedSignal();
 }
 
@@ -44,9 +47,28 @@ bool EventQueue::remove(const EventQueueItem* item)
             // Released after the entry is gone: its destruction must see a consistent queue.
             EventQueueItemSmartPtr gone = std::move(*it);
             m_items.erase(it);
+            ++m_changes;
             return true;
         }
     }
+    return false;
+}
+
+bool EventQueue::contains(const EventQueueItem* item) const
+{
+    for (const EventQueueItemSmartPtr& queued : m_items) {
+        if (queued.get() == item)
+            return true;
+    }
+    return false;
+}
+
+bool checkMainQueue(const EventQueue* queue, const char* file, int line, const char* function)
+{
+    if (queue == &gMainEventQueue)
+        return true;
+    if (queue)
+        velmar_assert("inQueue == Velmar::GetMainEventQueue()", file, line, function, nullptr);
     return false;
 }
 
@@ -65,6 +87,7 @@ EventQueueItemSmartPtr EventQueue::takeFirstMatching(const EventTypeSpec* list, 
         if (MatchesEventTypes(list, count, it->get())) {
             EventQueueItemSmartPtr found = std::move(*it);
             m_items.erase(it);
+            ++m_changes;
             return found;
         }
     }
@@ -75,6 +98,28 @@ void EventQueue::clearAll()
 {
     ItemList gone;
     gone.swap(m_items);
+    ++m_changes;
+}
+
+int EventQueue::removeAll(const std::vector<const EventQueueItem*>& items)
+{
+    if (items.empty())
+        return 0;
+    std::vector<const EventQueueItem*> doomed = items;
+    std::sort(doomed.begin(), doomed.end());
+    // Released only once the queue is consistent again: a destructor may look at it.
+    std::vector<EventQueueItemSmartPtr> gone;
+    ItemList kept;
+    for (EventQueueItemSmartPtr& queued : m_items) {
+        if (std::binary_search(doomed.begin(), doomed.end(), queued.get()))
+            gone.push_back(std::move(queued));
+        else
+            kept.push_back(std::move(queued));
+    }
+    m_items.swap(kept);
+    if (!gone.empty())
+        ++m_changes;
+    return int(gone.size());
 }
 
 void EventQueue::RaiseQueueChangedSignal()

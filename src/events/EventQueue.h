@@ -9,6 +9,7 @@
 #include <QEventLoop>
 
 #include <deque>
+#include <vector>
 
 namespace Velmar::Private {
 
@@ -33,9 +34,19 @@ public:
     void append(const EventQueueItemSmartPtr& item);
     // Removes the first entry holding `item`. False when it is not queued.
     bool remove(const EventQueueItem* item);
-    // Removes every entry for which pred(item) is true; returns how many went.
+    // Removes every entry for which pred(item) is true; returns how many went. `pred` may be
+    // a host's comparator: it may post, remove or flush while it runs. It is shown each item
+    // that was queued when the call began and is still queued when its turn comes.
     template <typename Pred>
     int removeIf(Pred pred);
+    // The first item for which pred(item) is true and which is still queued once pred has
+    // answered, or null. The same guarantees as removeIf.
+    template <typename Pred>
+    EventQueueItem* findIf(Pred pred);
+    // True while `item` is queued.
+    bool contains(const EventQueueItem* item) const;
+    // Removes the entries holding these items in one pass; returns how many went.
+    int removeAll(const std::vector<const EventQueueItem*>& items);
 
     // The first item whose (class, kind) is in the list (an empty list matches all),
     // looked at or taken out. Null when none matches.
@@ -70,6 +81,7 @@ public:
 
 private:
     ItemList m_items;
+    UInt64 m_changes = 0; // bumped by every change of m_items
     bool m_hasQueueChangeEvent = false;
     bool m_carbonEventsDisabled = false;
     UInt16 m_eventMask = 7;
@@ -77,6 +89,12 @@ private:
 
 extern EventQueue gMainEventQueue;
 inline EventQueue* MainEventQueue() { return &gMainEventQueue; }
+
+// There is one queue. Another non-null queue reference raises the assertion
+// "inQueue == Velmar::GetMainEventQueue()" and gives false; null gives false silently.
+bool checkMainQueue(const EventQueue* queue, const char* file, int line, const char* function);
+#define VELMAR_CHECK_QUEUE(queue)                                                          \
+    ::Velmar::Private::checkMainQueue((queue), __FILE__, __LINE__, __func__)
 
 // The wake-up posted to the application when the queue changed. Its type is registered
 // with Qt once, at start.
@@ -100,19 +118,34 @@ void FlushEventReferences(AQtWindow* window);
 template <typename Pred>
 int EventQueue::removeIf(Pred pred)
 {
-    int removed = 0;
-    // Collect first: releasing an item may run code that touches the queue.
-    ItemList gone;
-    for (auto it = m_items.begin(); it != m_items.end();) {
-        if (pred(it->get())) {
-            gone.push_back(std::move(*it));
-            it = m_items.erase(it);
-            ++removed;
-        } else {
-            ++it;
-        }
+    // Walk a snapshot that holds its own references: whatever the predicate does to the
+    // queue, no item it is shown can be freed under it and no iterator can go stale. Only
+    // once the queue has changed under the walk is each item checked to be still queued.
+    const std::vector<EventQueueItemSmartPtr> snapshot(m_items.begin(), m_items.end());
+    const UInt64 changesAtStart = m_changes;
+    std::vector<const EventQueueItem*> doomed;
+    for (const EventQueueItemSmartPtr& item : snapshot) {
+        if (m_changes != changesAtStart && !contains(item.get()))
+            continue;
+        if (pred(item.get()))
+            doomed.push_back(item.get());
     }
-    return removed;
+    return removeAll(doomed);
+}
+
+template <typename Pred>
+EventQueueItem* EventQueue::findIf(Pred pred)
+{
+    const std::vector<EventQueueItemSmartPtr> snapshot(m_items.begin(), m_items.end());
+    const UInt64 changesAtStart = m_changes;
+    for (const EventQueueItemSmartPtr& item : snapshot) {
+        if (m_changes != changesAtStart && !contains(item.get()))
+            continue;
+        // The item is handed back without a reference: only while the queue still holds one.
+        if (pred(item.get()) && (m_changes == changesAtStart || contains(item.get())))
+            return item.get();
+    }
+    return nullptr;
 }
 
 } // namespace Velmar::Private

@@ -34,7 +34,7 @@ void FlushEventReferences(AQtWindow* window)
 
 OSStatus FlushSpecificEventsFromQueue(EventQueueRef queue, EventComparatorUPP comparator, void* data)
 {
-    if (!queue || !comparator)
+    if (!VELMAR_CHECK_QUEUE(queue) || !comparator)
         return eventInternalErr;
     queue->removeIf([comparator, data](Private::EventQueueItem* item) { return comparator(item, data); });
     if (Private::LegacyEventProcessing())
@@ -42,14 +42,14 @@ OSStatus FlushSpecificEventsFromQueue(EventQueueRef queue, EventComparatorUPP co
     return noErr;
 }
 
+// The comparator may change the queue while it looks (see EventQueue::findIf).
 EventRef FindSpecificEventInQueue(EventQueueRef queue, EventComparatorUPP comparator, void* data)
 {
-    if (!queue || !comparator)
+    if (!VELMAR_CHECK_QUEUE(queue) || !comparator)
         return nullptr;
-    for (const Private::EventQueueItemSmartPtr& item : queue->items()) {
-        if (comparator(item.get(), data))
-            return item.get();
-    }
+    if (EventRef found = queue->findIf(
+            [comparator, data](Private::EventQueueItem* item) { return comparator(item, data); }))
+        return found;
     if (Private::LegacyEventProcessing())
         return Private::FindPendingUpdateEvent(comparator, data);
     return nullptr;
@@ -57,10 +57,12 @@ EventRef FindSpecificEventInQueue(EventQueueRef queue, EventComparatorUPP compar
 
 OSStatus RemoveEventFromQueue(EventQueueRef queue, EventRef event)
 {
-    if (!queue)
+    if (!VELMAR_CHECK_QUEUE(queue))
         return eventInternalErr;
     if (!event)
         return noErr;
+    if (!VELMAR_CHECK_EVENT(event))
+        return eventNotInQueueErr;
     // Asked before removing: the queue's reference may be the last one.
     const bool update = event->isUpdateEvent();
     queue->remove(event);
@@ -73,7 +75,7 @@ OSStatus RemoveEventFromQueue(EventQueueRef queue, EventRef event)
 
 UInt32 GetNumEventsInQueue(EventQueueRef queue)
 {
-    if (!queue)
+    if (!VELMAR_CHECK_QUEUE(queue))
         return 0;
     UInt32 n = queue->count();
     if (Private::LegacyEventProcessing())

@@ -3,27 +3,28 @@
 
 #include <Velmar/FeatureFlags.h>
 
+#include "host/Replaceable.h"
+
 namespace Velmar::Private {
 
 namespace {
 
-WindowEventHooks gWindowHooks;
-WaiterHooks gWaiterHooks;
+Replaceable<WindowEventHooks> gWindowHookSlot;
+Replaceable<WaiterHooks> gWaiterHookSlot;
+// Read on every queue operation: the two references spare a call.
+const WindowEventHooks& gWindowHooks = gWindowHookSlot.get();
+const WaiterHooks& gWaiterHooks = gWaiterHookSlot.get();
 
 } // namespace
 
 WindowEventHooks SetWindowEventHooks(const WindowEventHooks& hooks)
 {
-    WindowEventHooks old = gWindowHooks;
-    gWindowHooks = hooks;
-    return old;
+    return gWindowHookSlot.set(hooks);
 }
 
 WaiterHooks SetWaiterHooks(const WaiterHooks& hooks)
 {
-    WaiterHooks old = gWaiterHooks;
-    gWaiterHooks = hooks;
-    return old;
+    return gWaiterHookSlot.set(hooks);
 }
 
 const WindowEventHooks& windowEventHooks()

@@ -32,7 +32,9 @@ QString fourCharText(UInt32 code)
 EventQueueItem::EventQueueItem()
 {
     refCount = 1;
+    hostRefCount = 0;
     clearFields();
+    LiveHandles<EventQueueItem>::instance().add(this);
     noteCreated();
 }
 
@@ -40,12 +42,15 @@ EventQueueItem::EventQueueItem(const EventQueueItem& other)
 {
     *this = other;
     refCount = 1;
+    hostRefCount = 0;
+    LiveHandles<EventQueueItem>::instance().add(this);
     noteCreated();
 }
 
 EventQueueItem::~EventQueueItem()
 {
     VELMAR_ASSERT(refCount == 0, "refCount == 0");
+    LiveHandles<EventQueueItem>::instance().remove(this);
     --sLiveCount;
 }
 
@@ -126,10 +131,8 @@ void EventQueueItem::AddRef()
 void EventQueueItem::Release()
 {
     --refCount;
-    if (refCount < 0) {
-        velmar_assert("refCount >= 0", __FILE__, __LINE__, __func__, "refCount >= 0");
+    if (!VELMAR_ASSERT(refCount >= 0, "refCount >= 0"))
         return;
-    }
     if (refCount == 0)
         delete this;
 }

@@ -5,6 +5,8 @@
 #include <Velmar/CarbonEvents.h>
 #include <Velmar/Events.h>
 
+#include "foundation/LiveHandles.h"
+
 #include <QString>
 
 namespace Velmar::Private {
@@ -59,6 +61,10 @@ public:
     UInt32 modifiers;      // 'kmod'
     UInt32 qtKey;
     UInt32 qtModifiers;
+    // How many of refCount the host holds (MacCreateEvent, RetainEvent, an event handed out
+    // by ReceiveNextEvent): ReleaseEvent may give back only these, never a reference the
+    // queue or a handler chain holds.
+    UInt16 hostRefCount;
 
     static EventQueueItem* Create();
     EventQueueItem* Duplicate() const;
@@ -102,6 +108,10 @@ private:
     void clearFields();
     static void noteCreated();
 };
+
+// A live event: true. Null: false, silently. A freed or made-up one: the assertion
+// "IsValidEvent(event)", false.
+#define VELMAR_CHECK_EVENT(event) VELMAR_LIVE((event), "IsValidEvent(event)")
 
 // Holds one reference to an item. All internal code passes items through it.
 class EventQueueItemSmartPtr {

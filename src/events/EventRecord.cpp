@@ -76,10 +76,8 @@ EventRecord EventQueueItem::toEventRecord() const
         record.what = row->what;
         fill = row->fill;
     } else {
-        if (isRecordClass(eventClass))
-            velmar_assert("false", __FILE__, __LINE__, __func__, "false");
-        else
-            velmar_assert("FALSE", __FILE__, __LINE__, __func__, "FALSE");
+        // An unknown kind of a record class, or a class records never have.
+        VELMAR_ASSERT(false, isRecordClass(eventClass) ? "false" : "FALSE");
         return record;
     }
 
@@ -117,7 +115,7 @@ EventRecord EventQueueItem::toEventRecord() const
 
 bool ConvertEventRefToEventRecord(EventRef event, EventRecord* outRecord)
 {
-    if (!event || !outRecord || !event->isEventRecordCompatible())
+    if (!event || !outRecord || !VELMAR_CHECK_EVENT(event) || !event->isEventRecordCompatible())
         return false;
     *outRecord = event->toEventRecord();
     return true;

@@ -10,6 +10,12 @@ EventHandlerCall::EventHandlerCall(const EventQueueItemSmartPtr& item, UInt32 ta
     : m_item(item), m_targetType(targetType), m_list(list), m_walk(list),
       m_position(list.frontPosition())
 {
+    LiveHandles<EventHandlerCall>::instance().add(this);
+}
+
+EventHandlerCall::~EventHandlerCall()
+{
+    LiveHandles<EventHandlerCall>::instance().remove(this);
 }
 
 void EventHandlerCall::restart(UInt32 targetType)
@@ -30,13 +36,12 @@ bool EventHandlerCall::applies(const EventHandler& handler) const
 
 OSStatus EventHandlerCall::invokeNextHandler()
 {
-    if (m_targetType != EventTargetRef::TargetTypeApplication
-        && m_targetType != EventTargetRef::TargetTypeEventDispatcher
-        && m_targetType != EventTargetRef::TargetTypeWindow)
-        velmar_assert("targetType_ == EventTargetRef::TargetTypeApplication || targetType_ == "
-                      "EventTargetRef::TargetTypeEventDispatcher || targetType_ == "
-                      "EventTargetRef::TargetTypeWindow",
-                      __FILE__, __LINE__, __func__, "");
+    VELMAR_ASSERT(m_targetType == EventTargetRef::TargetTypeApplication
+                      || m_targetType == EventTargetRef::TargetTypeEventDispatcher
+                      || m_targetType == EventTargetRef::TargetTypeWindow,
+                  "targetType_ == EventTargetRef::TargetTypeApplication || targetType_ == "
+                  "EventTargetRef::TargetTypeEventDispatcher || targetType_ == "
+                  "EventTargetRef::TargetTypeWindow");
     // The list may grow or get holes while handlers run: re-read it at every step.
     while (m_position >= 0) {
         EventHandler* handler = m_list.at(m_position--);

@@ -10,6 +10,7 @@ class EventHandlerCall {
 public:
     EventHandlerCall(const EventQueueItemSmartPtr& item, UInt32 targetType,
                      HandlerList& list = HandlerList::instance());
+    ~EventHandlerCall();
     EventHandlerCall(const EventHandlerCall&) = delete;
     EventHandlerCall& operator=(const EventHandlerCall&) = delete;
 

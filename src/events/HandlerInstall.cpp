@@ -52,19 +52,18 @@ OSStatus RemoveEventHandler(EventHandlerRef inHandlerRef)
 {
     if (!inHandlerRef)
         return paramErr;
-    const int count = Private::HandlerList::instance().removeAndFree(inHandlerRef) ? 1 : 0;
     // An unknown handler may already be freed: it is reported, never touched.
-    VELMAR_ASSERT(count > 0, "RemoveEventHandler: handler is not installed");
+    VELMAR_ASSERT(Private::HandlerList::instance().removeAndFree(inHandlerRef),
+                  "IsValidEventHandler(inHandlerRef)");
     return noErr;
 }
 
 OSStatus CallNextEventHandler(EventHandlerCallRef inCallRef, EventRef inEvent)
 {
-    if (!inCallRef)
+    // A call reference lives only while its handler runs; a kept one is refused.
+    if (!inCallRef || !VELMAR_LIVE(inCallRef, "IsValidEventHandlerCall(inCallRef)"))
         return paramErr;
-    if (inCallRef->item().get() != inEvent)
-        velmar_assert("inCallRef->item().get() == inEvent", __FILE__, __LINE__, __func__,
-                      "CallNextEventHandler: event is not the one being dispatched");
+    VELMAR_ASSERT(inCallRef->item().get() == inEvent, "inCallRef->item().get() == inEvent");
     return inCallRef->invokeNextHandler();
 }
 

@@ -99,9 +99,10 @@ OSStatus PostEventToQueue(EventQueueRef queue, EventRef event, EventPriority)
 {
     if (!queue || !event)
         return eventInternalErr;
-    if (queue != GetMainEventQueue())
-        velmar_assert("inQueue == Velmar::GetMainEventQueue()", __FILE__, __LINE__, __func__,
-                      "inQueue == Velmar::GetMainEventQueue()");
+    // The event goes to the one queue even when the reference named another.
+    VELMAR_CHECK_QUEUE(queue);
+    if (!VELMAR_CHECK_EVENT(event))
+        return eventInternalErr;
     Private::ScheduleEvent(Private::EventQueueItemSmartPtr(event), Private::EventQueueItem::NoMerge);
     return noErr;
 }

@@ -46,8 +46,7 @@ void ScheduleEvent(const EventQueueItemSmartPtr& scheduled, EventQueueItem::Merg
         policy = item->GuessMergePolicy();
 
     if (policy != EventQueueItem::NoMerge) {
-        if (!item->window)
-            velmar_assert("item->window != NULL", __FILE__, __LINE__, __func__, "item->window != NULL");
+        VELMAR_ASSERT(item->window, "item->window != NULL");
         switch (policy) {
         case EventQueueItem::MergeIntoQueued:
             for (const EventQueueItemSmartPtr& queued : queue.items()) {

@@ -6,6 +6,7 @@
 #include <Velmar/HostShell.h>
 
 #include "events/AppActivation.h"
+#include "host/Replaceable.h"
 #include "events/EventQueue.h"
 #include "foundation/ApplicationPrivate.h"
 #include "foundation/MessageHandler.h"
@@ -23,7 +24,7 @@ namespace Velmar {
 namespace Private {
 
 namespace {
-ApplicationHooks gApplicationHooks;
+Replaceable<ApplicationHooks> gApplicationHooks;
 bool gInspectorEnabled = false;
 bool gInspectorCopyBitsToScreen = false;
 
@@ -46,14 +47,12 @@ QMenu* runningPopupMenu(const QObject* app)
 
 const ApplicationHooks& applicationHooks()
 {
-    return gApplicationHooks;
+    return gApplicationHooks.get();
 }
 
 ApplicationHooks SetApplicationHooks(const ApplicationHooks& hooks)
 {
-    const ApplicationHooks previous = gApplicationHooks;
-    gApplicationHooks = hooks;
-    return previous;
+    return gApplicationHooks.set(hooks);
 }
 
 bool inspectorEnabled()
@@ -116,9 +115,7 @@ AQtApplication* AQtApplication::instance()
 
 int AQtApplication::exec()
 {
-    AQtApplication* app = instance();
-    if (!app)
-        velmar_assert("NULL != app", __FILE__, __LINE__, __func__, nullptr);
+    VELMAR_ASSERT(instance(), "NULL != app");
     return QApplication::exec();
 }
 
@@ -198,10 +195,8 @@ void AQtApplication::onMenuBarTriggered(QAction* action)
 void AQtApplication::onMenuItemTriggered()
 {
     auto* action = qobject_cast<QAction*>(sender());
-    if (!action) {
-        velmar_assert("action", __FILE__, __LINE__, __func__, nullptr);
+    if (!VELMAR_ASSERT(action, "action"))
         return;
-    }
     onMenuBarTriggered(action);
 }
 

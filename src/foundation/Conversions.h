@@ -9,6 +9,8 @@
 #include <QRect>
 #include <QSize>
 
+#include <algorithm>
+
 namespace Velmar::Private {
 
 // A Toolbox rectangle's right and bottom edges lie outside it; a QRect's corners are
@@ -100,6 +102,34 @@ inline bool sameRect(const Rect& a, const Rect& b)
 inline bool samePoint(Point a, Point b)
 {
     return a.v == b.v && a.h == b.h;
+}
+
+// Coordinates the library computes with are kept within +-kFarCoordinate, far beyond any
+// 16-bit Toolbox value, so that Qt's int arithmetic on rectangles, polygons and regions
+// (widths, adjustments, translations) can never overflow.
+inline constexpr qint64 kFarCoordinate = qint64(1) << 29;
+
+inline int clampFar(qint64 v)
+{
+    return int(std::clamp(v, -kFarCoordinate, kFarCoordinate));
+}
+
+inline bool isFar(qint64 v)
+{
+    return v < -kFarCoordinate || v > kFarCoordinate;
+}
+
+// The rectangle with these inclusive edges, computed in 64 bits and clamped.
+inline QRect farRect(qint64 left, qint64 top, qint64 right, qint64 bottom)
+{
+    return QRect(QPoint(clampFar(left), clampFar(top)), QPoint(clampFar(right), clampFar(bottom)));
+}
+
+// `r` grown by `w` on every side, without overflow.
+inline QRect grownRect(const QRect& r, int w)
+{
+    return farRect(qint64(r.left()) - w, qint64(r.top()) - w, qint64(r.right()) + w,
+                   qint64(r.bottom()) + w);
 }
 
 // Channel conversions at the single-precision scale the whole library shares.

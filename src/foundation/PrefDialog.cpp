@@ -1,5 +1,7 @@
 #include "foundation/PrefDialog.h"
 
+#include "foundation/DiagnosticsPrivate.h"
+
 #include <Velmar/FeatureFlags.h>
 
 #include <QApplication>
@@ -93,9 +95,15 @@ QHash<int, UInt32> presetValues(bool defaults)
 
 } // namespace
 
+QString QtUIPrefDialog::title()
+{
+    return tr("UI Operation Preferences");
+}
+
 QtUIPrefDialog::QtUIPrefDialog(QWidget* parent)
     : QDialog(parent)
 {
+    setWindowTitle(title());
     auto* groupsColumn = new QVBoxLayout;
     QVBoxLayout* groupLayouts[std::size(kGroupTitles)];
     for (std::size_t g = 0; g < std::size(kGroupTitles); ++g) {
@@ -212,6 +220,10 @@ void QtUIPrefDialog::showValues(const QHash<int, UInt32>& values)
 
 void ShowUIOpDlg()
 {
+    // A scripted run never waits on the box: the listener's answer closes it unchanged.
+    if (Private::askAutomationListener(QtUIPrefDialog::title(), QString(),
+                                       QStringLiteral("OK|Cancel")))
+        return;
     if (!qobject_cast<QApplication*>(QCoreApplication::instance())) {
         qWarning("ShowUIOpDlg: no application object");
         return;

@@ -22,6 +22,8 @@ class QtUIPrefDialog : public QDialog {
 
 public:
     explicit QtUIPrefDialog(QWidget* parent = nullptr);
+    // The window title, also what an automation listener is asked under.
+    static QString title();
 
     QCheckBox* checkBox(Private::FeatureFlag flag) const { return m_checkBoxes.value(int(flag)); }
     QSpinBox* statUpdateRateBox() const { return m_statUpdateRate; }

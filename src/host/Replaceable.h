@@ -1,19 +1,27 @@
-// A service the host may replace: the default serves until a replacement is set, the setter
-// hands back what was in use, and setting null brings the default back.
+// A service or a set of hooks that another part of the program may replace. The default
+// serves until a replacement is set; the setter hands back what was in use, so that whoever
+// replaced it can put it back. For a pointer, setting null brings the default back; for a
+// set of hooks (a struct of function pointers), the default is the empty set.
 #pragma once
+
+#include <type_traits>
 
 namespace Velmar::Private {
 
-template <typename T> // a pointer: to a function or to a service object
+template <typename T>
 class Replaceable {
 public:
+    constexpr Replaceable() : m_default(), m_current() {}
     constexpr explicit Replaceable(T fallback) : m_default(fallback), m_current(fallback) {}
 
-    T get() const { return m_current; }
-    T set(T replacement)
+    const T& get() const { return m_current; }
+    T set(const T& replacement)
     {
-        const T previous = m_current;
-        m_current = replacement ? replacement : m_default;
+        T previous = m_current;
+        if constexpr (std::is_pointer_v<T>)
+            m_current = replacement ? replacement : m_default;
+        else
+            m_current = replacement;
         return previous;
     }
 

@@ -1,4 +1,5 @@
 // The global hilite state, colour-model conversions, InvertColor and the colour dialog.
+#include <Velmar/HostCore.h>
 #include <Velmar/HostEncoding.h>
 #include <Velmar/QuickDraw.h>
 
@@ -132,23 +133,57 @@ void InvertColor(RGBColor* color)
     color->blue = static_cast<unsigned short>(~color->blue);
 }
 
+namespace {
+
+QString promptText(const unsigned char* prompt)
+{
+    if (!prompt || prompt[0] == 0)
+        return QString();
+    unsigned short title[512];
+    const SInt32 units = CurrentMacMBCSEncodingToUTF16(reinterpret_cast<const char*>(prompt + 1),
+                                                       prompt[0], title, 512);
+    return QString::fromUtf16(reinterpret_cast<const char16_t*>(title), qMin<SInt32>(units, 511));
+}
+
+// A scripted run answers instead of a user: "OK" keeps the starting colour, "Cancel" (or
+// anything else) cancels, and a colour name such as "#3366cc" is chosen as that colour.
+std::optional<unsigned char> askAutomation(const QString& title, const QColor& start,
+                                           RGBColor* outColor)
+{
+    AutomationListener* listener = AutomationListenerManager::GetListener();
+    if (!listener)
+        return std::nullopt;
+    const QString answer =
+        listener->AnswerDialog(title, start.name(), QStringLiteral("OK|Cancel")).trimmed();
+    QColor chosen;
+    if (answer.compare(QLatin1String("OK"), Qt::CaseInsensitive) == 0 || answer == u'0')
+        chosen = start;
+    else if (QColor::isValidColorName(answer))
+        chosen = QColor::fromString(answer);
+    if (!chosen.isValid())
+        return 0;
+    *outColor = RGBColor(chosen);
+    return 1;
+}
+
+} // namespace
+
 unsigned char GetColor(Point /*where*/, const unsigned char* prompt, const RGBColor* inColor,
                        RGBColor* outColor)
 {
     if (!outColor)
         return 0;
+    const QColor start = inColor ? static_cast<QColor>(*inColor) : QColor(Qt::white);
+    const QString title = promptText(prompt);
+    if (std::optional<unsigned char> answer = askAutomation(title, start, outColor))
+        return *answer;
     if (!qobject_cast<QApplication*>(QCoreApplication::instance()))
         return 0;
     QColorDialog dialog;
     if (inColor)
-        dialog.setCurrentColor(static_cast<QColor>(*inColor));
-    if (prompt && prompt[0] > 0) {
-        unsigned short title[512];
-        const SInt32 units = CurrentMacMBCSEncodingToUTF16(
-            reinterpret_cast<const char*>(prompt + 1), prompt[0], title, 512);
-        dialog.setWindowTitle(QString::fromUtf16(reinterpret_cast<const char16_t*>(title),
-                                                 qMin<SInt32>(units, 511)));
-    }
+        dialog.setCurrentColor(start);
+    if (!title.isEmpty())
+        dialog.setWindowTitle(title);
     if (dialog.exec() != QDialog::Accepted)
         return 0;
     *outColor = RGBColor(dialog.selectedColor());

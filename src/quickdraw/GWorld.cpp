@@ -3,6 +3,7 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "foundation/Conversions.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/GrafPortPrivate.h"
 
 namespace Velmar {
@@ -60,11 +61,8 @@ SInt16 NewGWorldForPaintDevice(GrafPtr* out, SInt16 depth, const Rect* bounds, v
 UInt32 UpdateGWorld(GrafPtr* gw, SInt16 depth, const Rect* bounds, void* /*colorTable*/,
                     void* /*device*/, UInt32 /*flags*/)
 {
-    if (!gw || !isLivePort(*gw)) {
-        velmar_assert("gw && IsValidPort(*gw)", __FILE__, __LINE__, __func__,
-                      "UpdateGWorld needs a live world");
+    if (!VELMAR_ASSERT(gw && isLivePort(*gw), "gw && IsValidPort(*gw)"))
         return 0;
-    }
     const QRect rect = worldRect(bounds, depth);
     QtGrafPort* port = *gw;
     const bool same = rect == port->bounds;
@@ -76,16 +74,11 @@ void DisposeGWorld(GrafPtr offscreenGWorld)
 {
     // A stale pointer is never dereferenced: liveness is checked first.
     const bool live = isLivePort(offscreenGWorld);
-    if (!offscreenGWorld || (live && offscreenGWorld->window)) {
-        velmar_assert("offscreenGWorld != NULL && offscreenGWorld->window == NULL", __FILE__,
-                      __LINE__, __func__, "DisposeGWorld needs an offscreen world");
+    if (!VELMAR_ASSERT(offscreenGWorld && !(live && offscreenGWorld->window),
+                       "offscreenGWorld != NULL && offscreenGWorld->window == NULL"))
         return;
-    }
-    if (!live) {
-        VelmarLog(kLogGrafPort, "DisposeGWorld: %p is not a live world",
-                  static_cast<void*>(offscreenGWorld));
+    if (!VELMAR_ASSERT(live, "IsValidPort(offscreenGWorld)"))
         return;
-    }
     delete offscreenGWorld;
 }
 
@@ -96,22 +89,18 @@ GrafPtr CreateNewPort()
 
 void DisposePort(GrafPtr port)
 {
-    if (isLivePort(port) && !port->window)
+    if (VELMAR_CHECK_PORT(port, nullptr) && !port->window)
         delete port;
 }
 
 QPaintDevice* GetGWorldPaintDevice(GrafPtr* port)
 {
-    return (port && isLivePort(*port)) ? (*port)->paintDevice : nullptr;
+    return (port && VELMAR_CHECK_PORT(*port, nullptr)) ? (*port)->paintDevice : nullptr;
 }
 
 PixMapPtr* GetPortPixMap(GrafPtr port)
 {
-    if (!port) {
-        velmar_assert("port != NULL", __FILE__, __LINE__, __func__, "GetPortPixMap");
-        return nullptr;
-    }
-    return port->pixmap;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? port->pixmap : nullptr;
 }
 
 PixMapPtr* GetGWorldPixMap(GrafPtr port)
@@ -121,49 +110,35 @@ PixMapPtr* GetGWorldPixMap(GrafPtr port)
 
 const BitMapPtr& GetPortBitMapForCopyBits(GrafPtr port)
 {
-    if (!port) {
-        velmar_assert("port != NULL", __FILE__, __LINE__, __func__, "GetPortBitMapForCopyBits");
-        return emptyBitMap();
-    }
-    return *port->pixmap;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? *port->pixmap : emptyBitMap();
 }
 
 Rect* GetPortBounds(GrafPtr port, Rect* rect)
 {
     if (!rect)
         return rect;
-    if (!port)
-        *rect = makeRect(0, 0, 0, 0);
-    else
-        *rect = toRect(port->bounds);
+    *rect = VELMAR_CHECK_PORT(port, nullptr) ? toRect(port->bounds) : makeRect(0, 0, 0, 0);
     return rect;
 }
 
 void SetPortBounds(GrafPtr port, const Rect* rect)
 {
-    if (!port)
-        return;
-    port->setBounds(toQRect(rect));
+    if (VELMAR_CHECK_PORT(port, nullptr))
+        port->setBounds(toQRect(rect));
 }
 
 void PortSize(SInt16 width, SInt16 height)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        VelmarLog(kLogQuickDraw, "PortSize: current port is NULL");
-        return;
-    }
-    port->setBounds(QRect(port->bounds.topLeft(), QSize(width, height)));
+    CurrentPort port("PortSize");
+    if (port)
+        port->setBounds(QRect(port->bounds.topLeft(), QSize(width, height)));
 }
 
 void SetOrigin(SInt16 h, SInt16 v)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        VelmarLog(kLogQuickDraw, "SetOrigin: currentGrafPort = NULL");
-        return;
-    }
-    port->setOrigin(h, v);
+    CurrentPort port("SetOrigin");
+    if (port)
+        port->setOrigin(h, v);
 }
 
 } // namespace Velmar

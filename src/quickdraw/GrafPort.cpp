@@ -76,7 +76,7 @@ void PainterState::applyTo(QPainter& painter) const
 
 // ---- Construction and destruction ---------------------------------------------------------
 
-QtGrafPort::QtGrafPort(const QRect& requested, SInt16 pixelDepth)
+QtGrafPort::QtGrafPort(const QRect& requested, SInt16 pixelDepth) : d(new QtGrafPortPrivate)
 {
     QRect rect = requested;
     if (rect.width() < 1)
@@ -88,8 +88,9 @@ QtGrafPort::QtGrafPort(const QRect& requested, SInt16 pixelDepth)
 }
 
 QtGrafPort::QtGrafPort(AQtWindow* owner, const QRect& widgetRect, QImage* backBuffer)
-    : window(owner), m_image(backBuffer)
+    : window(owner), d(new QtGrafPortPrivate)
 {
+    d->image.reset(backBuffer);
     init(widgetRect, 6);
 }
 
@@ -105,7 +106,7 @@ void QtGrafPort::init(const QRect& rect, SInt16 pixelDepth)
     visibleRegion = QRegion(rect);
     clipRegion = QRegion(kWideOpenClip);
     bounds = rect;
-    pixmap = PixMapPtr::createPixMap(m_image.get(), this, pixelDepth ? pixelDepth : 6);
+    pixmap = PixMapPtr::createPixMap(d->image.get(), this, pixelDepth ? pixelDepth : 6);
     pixmap->clear();
     registerPort(this);
     applyOrigin();
@@ -132,12 +133,14 @@ QtGrafPort::~QtGrafPort()
     painter = nullptr;
     PixMapPtr::destroyPixMap(pixmap);
     pixmap = nullptr;
-    m_image.reset();
+    delete d;
+    d = nullptr;
 }
 
 bool QtGrafPort::allocateImage(const QSize& size)
 {
-    m_image.reset();
+    std::unique_ptr<QImage>& buffer = d->image;
+    buffer.reset();
     const qint64 pixels = qint64(size.width()) * size.height();
     if (pixels > kMaxPortPixels) {
         qWarning("QtGrafPort: a %dx%d image is too large; port %p keeps its bounds but has "
@@ -149,35 +152,42 @@ bool QtGrafPort::allocateImage(const QSize& size)
             qWarning("QtGrafPort: cannot allocate a %dx%d image for port %p", size.width(),
                      size.height(), static_cast<void*>(this));
         else
-            m_image = std::move(image);
+            buffer = std::move(image);
     }
     if (pixmap)
-        pixmap->m_image = m_image.get();
-    return m_image != nullptr;
+        pixmap->m_image = buffer.get();
+    return buffer != nullptr;
 }
 
 // ---- Painter ----------------------------------------------------------------------------
 
+bool QtGrafPort::isActive() const
+{
+    return d->painterActive;
+}
+
+QImage* QtGrafPort::image() const
+{
+    return d->image.get();
+}
+
 void QtGrafPort::BeginPaint()
 {
-    if (!painter || m_painterActive) {
-        velmar_assert("this && m_painter && !isActive()", __FILE__, __LINE__, __func__,
-                      "BeginPaint on a port whose painter is missing or already active");
+    if (!VELMAR_ASSERT(painter && !d->painterActive, "this && m_painter && !isActive()"))
         return;
-    }
-    QPaintDevice* target = paintDevice ? paintDevice : static_cast<QPaintDevice*>(m_image.get());
+    QPaintDevice* target = paintDevice ? paintDevice : static_cast<QPaintDevice*>(d->image.get());
     if (!target) {
         VelmarLog(kLogGrafPort, "Outside of PaintEvent: BeginPaint");
         return;
     }
-    if (!paintDevice && !m_image->paintEngine())
+    if (!paintDevice && !d->image->paintEngine())
         VelmarLog(kLogGrafPort, "Something bad happens. paintEngine is NULL, qtPort=%p",
                   static_cast<void*>(this));
     if (!painter->begin(target))
         return;
     painterState.applyTo(*painter);
-    m_painterActive = true;
-    ++inkSerial;
+    d->painterActive = true;
+    d->inkChanged();
 
     auto& active = activePorts();
     active.push_back(this);
@@ -188,11 +198,11 @@ void QtGrafPort::BeginPaint()
 
 void QtGrafPort::EndPaint()
 {
-    if (m_painterActive) {
-        ++inkSerial;
+    if (d->painterActive) {
+        d->inkChanged();
         painterState.saveFrom(*painter);
         painter->end();
-        m_painterActive = false;
+        d->painterActive = false;
     }
     auto& active = activePorts();
     auto it = std::find(active.begin(), active.end(), this);
@@ -216,17 +226,42 @@ void holdState(QPainter* painter, bool active, Setter set, Value& saved, const V
 
 } // namespace
 
+const QPen& QtGrafPort::currentPen() const
+{
+    return d->painterActive ? painter->pen() : painterState.pen;
+}
+
+const QBrush& QtGrafPort::currentBrush() const
+{
+    return d->painterActive ? painter->brush() : painterState.brush;
+}
+
+const QBrush& QtGrafPort::currentBackground() const
+{
+    return d->painterActive ? painter->background() : painterState.background;
+}
+
+QPainter::CompositionMode QtGrafPort::currentCompositionMode() const
+{
+    return d->painterActive ? painter->compositionMode() : painterState.compositionMode;
+}
+
+const QFont& QtGrafPort::currentFont() const
+{
+    return d->painterActive ? painter->font() : painterState.font;
+}
+
 void QtGrafPort::setPen(const QPen& pen)
 {
-    ++inkSerial;
-    holdState(painter, m_painterActive, qOverload<const QPen&>(&QPainter::setPen),
+    d->inkChanged();
+    holdState(painter, d->painterActive, qOverload<const QPen&>(&QPainter::setPen),
               painterState.pen, pen);
 }
 
 void QtGrafPort::setForeColor(const QColor& color)
 {
-    ++inkSerial;
-    if (m_painterActive) {
+    d->inkChanged();
+    if (d->painterActive) {
         if (painter->pen().color() == color)
             return;
         QPen pen = painter->pen();
@@ -239,41 +274,42 @@ void QtGrafPort::setForeColor(const QColor& color)
 
 void QtGrafPort::setBrush(const QBrush& brush)
 {
-    ++inkSerial;
-    holdState(painter, m_painterActive, qOverload<const QBrush&>(&QPainter::setBrush),
+    d->inkChanged();
+    holdState(painter, d->painterActive, qOverload<const QBrush&>(&QPainter::setBrush),
               painterState.brush, brush);
 }
 
 void QtGrafPort::setBackground(const QBrush& brush)
 {
-    ++inkSerial;
-    holdState(painter, m_painterActive, &QPainter::setBackground, painterState.background,
+    d->inkChanged();
+    holdState(painter, d->painterActive, &QPainter::setBackground, painterState.background,
               brush);
 }
 
 void QtGrafPort::setCompositionMode(QPainter::CompositionMode mode)
 {
-    ++inkSerial;
-    holdState(painter, m_painterActive, &QPainter::setCompositionMode,
+    d->inkChanged();
+    holdState(painter, d->painterActive, &QPainter::setCompositionMode,
               painterState.compositionMode, mode);
 }
 
 void QtGrafPort::setFont(const QFont& font)
 {
-    holdState(painter, m_painterActive, &QPainter::setFont, painterState.font, font);
+    holdState(painter, d->painterActive, &QPainter::setFont, painterState.font, font);
 }
 
 // ---- Geometry and clip ----------------------------------------------------------------------
 
 void QtGrafPort::setBounds(const QRect& requested)
 {
-    if (m_image && m_image->size() == requested.size()) {
+    std::unique_ptr<QImage>& buffer = d->image;
+    if (buffer && buffer->size() == requested.size()) {
         visibleRegion.translate(requested.topLeft() - bounds.topLeft());
         bounds = requested;
         applyOrigin();
         return;
     }
-    const bool wasActive = m_painterActive;
+    const bool wasActive = d->painterActive;
     if (wasActive)
         EndPaint();
 
@@ -291,12 +327,12 @@ void QtGrafPort::setBounds(const QRect& requested)
 
     if (window) {
         // A window's buffer is repainted by the window: the old content is not kept.
-        if (m_image) {
+        if (buffer) {
             const PortWindowHooks& hooks = portWindowHooks();
             QImage* fresh = hooks.makeBackBuffer ? hooks.makeBackBuffer(window, rect.size())
                                                  : nullptr;
             if (fresh) {
-                m_image.reset(fresh);
+                buffer.reset(fresh);
                 pixmap->m_image = fresh;
             } else {
                 allocateImage(rect.size());
@@ -304,11 +340,11 @@ void QtGrafPort::setBounds(const QRect& requested)
             pixmap->clear();
         }
     } else {
-        std::unique_ptr<QImage> old = std::move(m_image);
+        std::unique_ptr<QImage> old = std::move(buffer);
         if (allocateImage(rect.size())) {
             pixmap->clear();
             if (old) {
-                QPainter copier(m_image.get());
+                QPainter copier(buffer.get());
                 copier.setCompositionMode(QPainter::CompositionMode_Source);
                 copier.drawImage(0, 0, *old);
             }
@@ -319,7 +355,7 @@ void QtGrafPort::setBounds(const QRect& requested)
 
     if (wasActive) {
         BeginPaint();
-        if (!m_painterActive)
+        if (!d->painterActive)
             VelmarLog(kLogGrafPort, "Unable to start painter, grafPort: %p",
                       static_cast<void*>(this));
     }
@@ -339,7 +375,7 @@ void QtGrafPort::setOrigin(int h, int v)
 void QtGrafPort::applyOrigin()
 {
     painterState.transform = QTransform::fromTranslate(-bounds.left(), -bounds.top());
-    if (m_painterActive)
+    if (d->painterActive)
         painter->setTransform(painterState.transform);
     updateEffectiveClip();
 }
@@ -353,7 +389,7 @@ void QtGrafPort::updateEffectiveClip()
     // Clipping costs on every fill; skip it when the clip covers the whole port.
     const bool coversPort = effective.rectCount() == 1 && effective.boundingRect().contains(bounds);
     painterState.clipEnabled = !coversPort;
-    if (m_painterActive) {
+    if (d->painterActive) {
         if (painterState.clipEnabled)
             painter->setClipRegion(effective);
         else

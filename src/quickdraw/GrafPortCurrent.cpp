@@ -2,11 +2,11 @@
 #include <Velmar/Diagnostics.h>
 #include <Velmar/QtGrafPort.h>
 
+#include "host/Replaceable.h"
 #include "quickdraw/GrafPortPrivate.h"
 
 #include <algorithm>
 #include <cstdio>
-#include <unordered_set>
 
 namespace Velmar {
 
@@ -16,62 +16,61 @@ QtGrafPort* gCurrentGrafPort = nullptr;
 
 namespace {
 
-struct PortRegistry {
-    std::vector<QtGrafPort*> ordered;
-    std::unordered_set<const QtGrafPort*> lookup;
-};
-
-PortRegistry& registry()
+// Live ports in creation order; the live-handle registry answers the lookups.
+std::vector<QtGrafPort*>& orderedPorts()
 {
-    static PortRegistry sRegistry;
-    return sRegistry;
+    static std::vector<QtGrafPort*> sOrdered;
+    return sOrdered;
 }
 
-PortWindowHooks gHooks;
+Replaceable<PortWindowHooks> gHooks;
 
 } // namespace
 
-bool isLivePort(const QtGrafPort* port)
-{
-    if (!port)
-        return false;
-    const auto& lookup = registry().lookup;
-    return lookup.find(port) != lookup.end() && port->magic == QtGrafPort::kLiveMagic;
-}
-
 void registerPort(QtGrafPort* port)
 {
-    registry().ordered.push_back(port);
-    registry().lookup.insert(port);
+    orderedPorts().push_back(port);
+    LiveHandles<QtGrafPort>::instance().add(port);
 }
 
 void unregisterPort(QtGrafPort* port)
 {
-    auto& ordered = registry().ordered;
+    auto& ordered = orderedPorts();
     auto it = std::find(ordered.begin(), ordered.end(), port);
     if (it != ordered.end())
         ordered.erase(it);
-    registry().lookup.erase(port);
+    LiveHandles<QtGrafPort>::instance().remove(port);
 }
 
 const std::vector<QtGrafPort*>& livePorts()
 {
-    return registry().ordered;
+    return orderedPorts();
 }
 
-void setPortWindowHooks(const PortWindowHooks& hooks)
+bool checkPort(const QtGrafPort* port, const char* nullText, const char* file, int line,
+               const char* function)
 {
-    gHooks = hooks;
+    if (port == gCurrentGrafPort && port)
+        return true;
+    if (!port) {
+        if (nullText)
+            velmar_assert(nullText, file, line, function, nullptr);
+        return false;
+    }
+    if (isLivePort(port))
+        return true;
+    velmar_assert("IsValidPort(port)", file, line, function, nullptr);
+    return false;
+}
+
+PortWindowHooks setPortWindowHooks(const PortWindowHooks& hooks)
+{
+    return gHooks.set(hooks);
 }
 
 const PortWindowHooks& portWindowHooks()
 {
-    return gHooks;
-}
-
-void warnNoPort(const char* message)
-{
-    VelmarLog(kLogQuickDraw, "%s", message);
+    return gHooks.get();
 }
 
 } // namespace Private

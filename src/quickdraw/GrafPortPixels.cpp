@@ -3,6 +3,8 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "foundation/Conversions.h"
+#include "quickdraw/CurrentPort.h"
+#include "quickdraw/RegionHandles.h"
 #include "quickdraw/PortPainter.h"
 
 #include <QImage>
@@ -34,11 +36,9 @@ bool devicePixel(const QtGrafPort* port, int h, int v, QPoint* out)
 
 void SetCPixel(SInt16 h, SInt16 v, const RGBColor* color)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("warning: SetCPixel: cannot get Qt port");
+    CurrentPort port("SetCPixel");
+    if (!port)
         return;
-    }
     if (!port->image()) {
         VelmarLog(kLogQuickDraw, "SetCPixel has not implemented for DirectQtDrawing");
         return;
@@ -55,11 +55,9 @@ void GetCPixel(SInt16 h, SInt16 v, RGBColor* color)
 {
     if (!color)
         return;
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port) {
-        warnNoPort("warning: GetCPixel: cannot get Qt port");
+    CurrentPort port("GetCPixel");
+    if (!port)
         return;
-    }
     QPoint p;
     if (!devicePixel(port, h, v, &p)) {
         // No pixels there (no image, or outside it): black, as an empty port reads.
@@ -76,7 +74,7 @@ void GlobalToLocal(Point* point)
 
 void LocalToGlobal(Point* point)
 {
-    QtGrafPort* port = gCurrentGrafPort;
+    QtGrafPort* port = currentGrafPort();
     const PortWindowHooks& hooks = portWindowHooks();
     if (!port || !point || !port->window || !hooks.mapToGlobal)
         return;
@@ -87,7 +85,7 @@ void LocalToGlobal(Point* point)
 Rect* QDLocalToGlobalRect(GrafPtr port, Rect* rect)
 {
     const PortWindowHooks& hooks = portWindowHooks();
-    if (!port || !rect || !port->window || !hooks.mapToGlobal)
+    if (!VELMAR_CHECK_PORT(port, nullptr) || !rect || !port->window || !hooks.mapToGlobal)
         return rect;
     const QPoint topLeft =
         hooks.mapToGlobal(port->window, QPoint(rect->left, rect->top) - port->origin());
@@ -100,7 +98,7 @@ Rect* QDLocalToGlobalRect(GrafPtr port, Rect* rect)
 Point* QDGlobalToLocalPoint(GrafPtr port, Point* point)
 {
     const PortWindowHooks& hooks = portWindowHooks();
-    if (!port || !point || !port->window || !hooks.mapFromGlobal)
+    if (!VELMAR_CHECK_PORT(port, nullptr) || !point || !port->window || !hooks.mapFromGlobal)
         return point;
     const QPoint widget = hooks.mapFromGlobal(port->window, toQPoint(*point));
     *point = toPoint(widget + port->origin());
@@ -110,16 +108,19 @@ Point* QDGlobalToLocalPoint(GrafPtr port, Point* point)
 void QDFlushPortBuffer(GrafPtr port, RgnHandle /*region*/)
 {
     const PortWindowHooks& hooks = portWindowHooks();
-    if (!port || !port->window || !hooks.flush || isDirectDrawing(port))
+    if (!VELMAR_CHECK_PORT(port, nullptr) || !port->window || !hooks.flush
+        || isDirectDrawing(port))
         return;
     hooks.flush(port->window);
 }
 
 void ScrollRect(const Rect* r, SInt16 dh, SInt16 dv, RgnHandle updateRgn)
 {
-    VELMAR_ASSERT(r != nullptr, "NULL != r");
-    VELMAR_ASSERT(updateRgn != nullptr, "NULL != updateRgn");
-    QtGrafPort* port = gCurrentGrafPort;
+    VELMAR_ASSERT(r, "NULL != r");
+    VELMAR_ASSERT(updateRgn, "NULL != updateRgn");
+    if (updateRgn && !VELMAR_CHECK_REGION(updateRgn))
+        updateRgn = nullptr;
+    QtGrafPort* port = currentGrafPort();
     if ((dh == 0 && dv == 0) || !port) {
         if (updateRgn)
             *updateRgn = QRegion();
@@ -127,17 +128,19 @@ void ScrollRect(const Rect* r, SInt16 dh, SInt16 dv, RgnHandle updateRgn)
     }
     if (!r)
         return;
-    const QRect rect = toQRect(r);
     if (isDirectDrawing(port)) {
         const PortWindowHooks& hooks = portWindowHooks();
         if (hooks.scrollRect)
-            hooks.scrollRect(port->window, rect, dh, dv, updateRgn);
+            hooks.scrollRect(port->window, toQRect(r), dh, dv, updateRgn);
         return;
     }
     QPainter* painter = portPainter(port, "ScrollRect");
     if (!painter || !port->image())
         return;
 
+    // Only pixels the port has can move: the rectangle is cut to the port first, so the
+    // temporary copy is never larger than the port's image.
+    const QRect rect = toQRect(r) & port->bounds;
     // The part that stays visible, and where it goes.
     QRect source = rect;
     if (dh < 0)
@@ -158,7 +161,8 @@ void ScrollRect(const Rect* r, SInt16 dh, SInt16 dv, RgnHandle updateRgn)
     if (!moved.isNull())
         painter->drawImage(destination.topLeft(), moved);
     painter->setCompositionMode(mode);
-    port->markDirty(rect);
+    if (rect.isValid())
+        port->markDirty(rect);
 
     if (updateRgn)
         *updateRgn = QRegion(rect) - QRegion(destination);

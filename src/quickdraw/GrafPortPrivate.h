@@ -4,11 +4,57 @@
 
 #include <Velmar/QtGrafPort.h>
 
+#include "foundation/LiveHandles.h"
+
+#include <QImage>
+
+#include <memory>
 #include <vector>
 
-class QImage;
-
 namespace Velmar::Private {
+
+// A port's private record: its pixels, whether its painter runs, and the caches that spare
+// repeated drawing any work. None of it is port state a host can see.
+struct QtGrafPortPrivate {
+    std::unique_ptr<QImage> image;
+    bool painterActive = false;
+
+    // Bumped by every ink setter and by BeginPaint/EndPaint, by RGBBackColor and the pen
+    // mode: the resolved brushes below are reused while it is unchanged. Code that changes
+    // the painter's pen or brush directly and leaves it changed must call inkChanged().
+    UInt32 inkSerial = 0;
+    void inkChanged() { ++inkSerial; }
+
+    // Last resolved fill and background brushes, so that repeated drawing with the same
+    // pattern and colours builds nothing.
+    struct BrushCache {
+        UInt32 serial = 0;
+        bool valid = false;
+        QBrush source;
+        QRgb ink = 0;
+        QRgb paper = 0;
+        bool transparentPaper = false;
+        QBrush result;
+    };
+    BrushCache fillCache;
+    BrushCache backCache;
+
+    // The pen as it was when HidePen hid it.
+    QPen savedPen;
+
+    static QtGrafPortPrivate* get(QtGrafPort* port) { return port->d; }
+    static const QtGrafPortPrivate* get(const QtGrafPort* port) { return port->d; }
+};
+
+inline QtGrafPortPrivate* portData(QtGrafPort* port)
+{
+    return QtGrafPortPrivate::get(port);
+}
+
+inline bool painterRuns(const QtGrafPort* port)
+{
+    return QtGrafPortPrivate::get(port)->painterActive;
+}
 
 // The current port. Read on every drawing call, so it is a plain global.
 extern QtGrafPort* gCurrentGrafPort;
@@ -20,7 +66,19 @@ inline QtGrafPort* currentGrafPort()
 
 // True when `port` is a live port of this process (registered and carrying the live magic).
 // Never dereferences a pointer that is not registered.
-bool isLivePort(const QtGrafPort* port);
+inline bool isLivePort(const QtGrafPort* port)
+{
+    return isLive(port) && port->magic == QtGrafPort::kLiveMagic;
+}
+
+// The port a call was given, when it is live. Null is refused with the assertion `nullText`
+// (the call's documented one, e.g. "port != NULL"), or silently when `nullText` is null (the
+// call then logs its own line); a stale port with "IsValidPort(port)". Either gives false.
+// The current port is live by construction and costs no lookup.
+bool checkPort(const QtGrafPort* port, const char* nullText, const char* file, int line,
+               const char* function);
+#define VELMAR_CHECK_PORT(port, nullText)                                                  \
+    ::Velmar::Private::checkPort((port), (nullText), __FILE__, __LINE__, __func__)
 
 // What a port needs from its window. The window layer installs these once; while a hook is
 // null the port behaves as an offscreen world would. Rectangles are in device (widget)
@@ -47,7 +105,11 @@ struct PortWindowHooks {
     QImage* (*makeBackBuffer)(AQtWindow* window, const QSize& size) = nullptr;
 };
 
-void setPortWindowHooks(const PortWindowHooks& hooks);
+// Sets a port's clip region and puts it in force (SetPortClipRegion without the handle).
+void setPortClip(QtGrafPort* port, const QRegion& region);
+
+// Installs the window hooks; returns the ones they replace (an empty set removes them).
+PortWindowHooks setPortWindowHooks(const PortWindowHooks& hooks);
 const PortWindowHooks& portWindowHooks();
 
 // Ports whose painter is active, oldest first; at most kMaxActivePainters.
@@ -55,9 +117,6 @@ inline constexpr int kMaxActivePainters = 50;
 int activePainterCount();
 bool isPainterListed(const QtGrafPort* port);
 
-// Logs a fixed "warning: X: Can't get current port !" style message in the QuickDraw
-// category.
-void warnNoPort(const char* message);
 
 // The global hilite colour every new port copies.
 QColor globalHiliteColor();

@@ -2,7 +2,9 @@
 #include <Velmar/Diagnostics.h>
 #include <Velmar/QtGrafPort.h>
 
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/RegionHandles.h"
 
 namespace Velmar {
 
@@ -17,23 +19,13 @@ RGBColor* storeColor(const QColor& color, RGBColor* out)
     return out;
 }
 
-bool checkPort(GrafPtr port, const char* function)
-{
-    if (port)
-        return true;
-    velmar_assert("port != NULL", __FILE__, __LINE__, function, "a port is required");
-    return false;
-}
-
-// The colour setters of the current port: without a port they log `noPortWarning` (a fixed
-// text); a null colour changes nothing.
+// The colour setters of the current port: without a port they log the call's warning; a null
+// colour changes nothing.
 template <typename Store>
-void setCurrentPortColor(const RGBColor* color, const char* noPortWarning, Store store)
+void setCurrentPortColor(const char* call, const RGBColor* color, Store store)
 {
-    QtGrafPort* port = gCurrentGrafPort;
-    if (!port)
-        warnNoPort(noPortWarning);
-    else if (color)
+    CurrentPort port(call);
+    if (port && color)
         store(port, static_cast<QColor>(*color));
 }
 
@@ -41,79 +33,76 @@ void setCurrentPortColor(const RGBColor* color, const char* noPortWarning, Store
 
 RGBColor* GetPortBackColor(GrafPtr port, RGBColor* color)
 {
-    return checkPort(port, __func__) ? storeColor(port->backColor, color) : color;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? storeColor(port->backColor, color) : color;
 }
 
 RGBColor* GetPortForeColor(GrafPtr port, RGBColor* color)
 {
-    return checkPort(port, __func__) ? storeColor(port->foreColor(), color) : color;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? storeColor(port->foreColor(), color) : color;
 }
 
 RGBColor* GetPortHiliteColor(GrafPtr port, RGBColor* color)
 {
-    return checkPort(port, __func__) ? storeColor(port->hiliteColor, color) : color;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? storeColor(port->hiliteColor, color) : color;
 }
 
 RGBColor* GetPortOpColor(GrafPtr port, RGBColor* color)
 {
-    return checkPort(port, __func__) ? storeColor(port->opColor, color) : color;
+    return VELMAR_CHECK_PORT(port, "port != NULL") ? storeColor(port->opColor, color) : color;
 }
 
 void SetPortOpColor(GrafPtr port, const RGBColor* color)
 {
-    if (checkPort(port, __func__) && color)
+    if (VELMAR_CHECK_PORT(port, "port != NULL") && color)
         port->opColor = static_cast<QColor>(*color);
 }
 
 void GetBackColor(RGBColor* color)
 {
-    if (QtGrafPort* port = gCurrentGrafPort)
+    if (CurrentPort port("GetBackColor"); port)
         storeColor(port->backColor, color);
-    else
-        warnNoPort("warning: GetBackColor: Can't get current port !");
 }
 
 void GetForeColor(RGBColor* color)
 {
-    if (QtGrafPort* port = gCurrentGrafPort)
+    if (CurrentPort port("GetForeColor"); port)
         storeColor(port->foreColor(), color);
-    else
-        warnNoPort("warning: GetForeColor: Can't get current port!");
 }
 
 void RGBBackColor(const RGBColor* color)
 {
-    setCurrentPortColor(color, "warning: RGBBackColor: Can't get current port!",
-                        [](QtGrafPort* port, const QColor& c) {
-                            port->backColor = c;
-                            port->inkChanged();
-                        });
+    setCurrentPortColor("RGBBackColor", color, [](QtGrafPort* port, const QColor& c) {
+        port->backColor = c;
+        portData(port)->inkChanged();
+    });
 }
 
 void RGBForeColor(const RGBColor* color)
 {
-    setCurrentPortColor(color, "warning: RGBForeColor: Can't get current port!",
+    setCurrentPortColor("RGBForeColor", color,
                         [](QtGrafPort* port, const QColor& c) { port->setForeColor(c); });
 }
 
 void OpColor(const RGBColor* color)
 {
-    setCurrentPortColor(color, "OpColor: Can't get port",
+    setCurrentPortColor("OpColor", color,
                         [](QtGrafPort* port, const QColor& c) { port->opColor = c; });
 }
 
 void HiliteColor(const RGBColor* color)
 {
-    setCurrentPortColor(color, "warning: HiliteColor: Can't get current port!",
+    setCurrentPortColor("HiliteColor", color,
                         [](QtGrafPort* port, const QColor& c) { port->hiliteColor = c; });
 }
 
 Point* GetPortPenLocation(GrafPtr port, Point* location)
 {
     if (!port) {
-        warnNoPort("warning: GetPortPenLocation: cannot get Qt port");
+        warnNoCurrentPort("GetPortPenLocation");
         return nullptr;
     }
+    if (!VELMAR_CHECK_PORT(port, nullptr))
+        return nullptr;
     if (location) {
         location->v = static_cast<SInt16>(port->penY);
         location->h = static_cast<SInt16>(port->penX);
@@ -124,15 +113,26 @@ Point* GetPortPenLocation(GrafPtr port, Point* location)
 SInt16 GetPortPenMode(GrafPtr port)
 {
     if (!port) {
-        warnNoPort("warning: GetPortPenMode: cannot get Qt port");
+        warnNoCurrentPort("GetPortPenMode");
         return 0;
     }
-    return port->penMode;
+    return VELMAR_CHECK_PORT(port, nullptr) ? port->penMode : SInt16(0);
 }
+
+namespace Private {
+
+void setPortClip(QtGrafPort* port, const QRegion& region)
+{
+    port->clipRegion = region;
+    port->clipInForce = 1;
+    port->updateEffectiveClip();
+}
+
+} // namespace Private
 
 void SetPortVisibleRegion(GrafPtr port, RgnHandle region)
 {
-    if (!port || !region)
+    if (!VELMAR_CHECK_PORT(port, nullptr) || !VELMAR_CHECK_REGION(region))
         return;
     port->visibleRegion = *region;
     port->updateEffectiveClip();
@@ -140,20 +140,13 @@ void SetPortVisibleRegion(GrafPtr port, RgnHandle region)
 
 void SetPortClipRegion(GrafPtr port, RgnHandle region)
 {
-    if (!port) {
-        velmar_assert("port", __FILE__, __LINE__, __func__, "SetPortClipRegion needs a port");
-        return;
-    }
-    if (!region)
-        return;
-    port->clipRegion = *region;
-    port->clipInForce = 1;
-    port->updateEffectiveClip();
+    if (VELMAR_CHECK_PORT(port, "port") && VELMAR_CHECK_REGION(region))
+        setPortClip(port, *region);
 }
 
 RgnHandle GetPortVisibleRegion(GrafPtr port, RgnHandle region)
 {
-    if (!port || !region)
+    if (!VELMAR_CHECK_PORT(port, nullptr) || !VELMAR_CHECK_REGION(region))
         return region;
     const PortWindowHooks& hooks = portWindowHooks();
     if (port->window && hooks.visibleRegion && hooks.visibleRegion(port->window, region))
@@ -164,7 +157,7 @@ RgnHandle GetPortVisibleRegion(GrafPtr port, RgnHandle region)
 
 RgnHandle GetPortClipRegion(GrafPtr port, RgnHandle region)
 {
-    if (port && region)
+    if (VELMAR_CHECK_PORT(port, nullptr) && VELMAR_CHECK_REGION(region))
         *region = port->clipRegion;
     return region;
 }

@@ -3,6 +3,7 @@
 #include <Velmar/QDShapes.h>
 #include <Velmar/QuickDraw.h>
 
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 #include "quickdraw/ShapeRecording.h"
@@ -15,11 +16,12 @@ using namespace Private;
 
 namespace {
 
-// The pixels a pen `w` wide can touch around the segment.
+// The pixels a pen `w` wide can touch around the segment. The pen location may be any
+// 32-bit value (SetPenState), so the sum is taken in 64 bits.
 QRect lineDirty(int x0, int y0, int x1, int y1, int w)
 {
-    return QRect(QPoint(qMin(x0, x1), qMin(y0, y1)), QPoint(qMax(x0, x1), qMax(y0, y1)))
-        .adjusted(-w, -w, w, w);
+    return farRect(qint64(qMin(x0, x1)) - w, qint64(qMin(y0, y1)) - w, qint64(qMax(x0, x1)) + w,
+                   qint64(qMax(y0, y1)) + w);
 }
 
 void lineTo(QtGrafPort* port, int h, int v)
@@ -47,41 +49,42 @@ void moveTo(QtGrafPort* port, int h, int v)
     port->penY = v;
 }
 
-// Pen coordinates travel as 16-bit Toolbox values.
-short wrap(int value)
+// Pen coordinates travel as 16-bit Toolbox values; a relative move wraps as it did on a
+// Toolbox host, whatever 32-bit location SetPenState left.
+short wrap(qint64 value)
 {
-    return short(value);
+    return short(value & 0xFFFF);
 }
 
 } // namespace
 
 void MoveTo(short h, short v)
 {
-    if (QtGrafPort* port = shapePort("warning: MoveTo: cannot get current port"))
+    if (CurrentPort port("MoveTo"); port)
         moveTo(port, h, v);
 }
 
 void Move(short dh, short dv)
 {
-    if (QtGrafPort* port = shapePort("warning: Move: cannot get current port"))
-        moveTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
+    if (CurrentPort port("Move"); port)
+        moveTo(port, wrap(qint64(port->penX) + dh), wrap(qint64(port->penY) + dv));
 }
 
 void LineTo(short h, short v)
 {
-    if (QtGrafPort* port = shapePort("warning: LineTo: cannot get current port"))
+    if (CurrentPort port("LineTo"); port)
         lineTo(port, h, v);
 }
 
 void Line(short dh, short dv)
 {
-    if (QtGrafPort* port = shapePort("warning: Line: cannot get current port"))
-        lineTo(port, wrap(port->penX + dh), wrap(port->penY + dv));
+    if (CurrentPort port("Line"); port)
+        lineTo(port, wrap(qint64(port->penX) + dh), wrap(qint64(port->penY) + dv));
 }
 
 void DrawLinesFromPointPairs(const QList<QPoint>& points)
 {
-    if (!shapePort("warning: DrawLinesFromPointPairs: cannot get Qt port") || points.size() < 2)
+    if (!CurrentPort("DrawLinesFromPointPairs") || points.size() < 2)
         return;
     const QRect bounds = QPolygon(points).boundingRect();
     strokeShape("DrawLinesFromPointPairs", bounds, [&points](QPainter* p) {
@@ -91,7 +94,8 @@ void DrawLinesFromPointPairs(const QList<QPoint>& points)
 
 void DrawPolylineFromPoints(const QList<QPoint>& points)
 {
-    if (!shapePort("warning: DrawPolylineFromPoints: cannot get Qt port") || points.isEmpty())
+    // Both point-list calls warn under one name, deliberately.
+    if (!CurrentPort("DrawLinesFromPointPairs") || points.isEmpty())
         return;
     const QRect bounds = QPolygon(points).boundingRect();
     strokeShape("DrawPolylineFromPoints", bounds, [&points](QPainter* p) {

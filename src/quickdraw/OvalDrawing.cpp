@@ -24,7 +24,7 @@ void fillOval(const char* caller, SInt16 verb, const Rect* r, const PatPtr* patt
 void FrameOval(const Rect* r)
 {
     const QRect q = toQRect(r);
-    if (!framingPort("warning: FrameOval: cannot get current port",
+    if (!framingPort("FrameOval",
                      [&q] { return QRegion(q, QRegion::Ellipse); })
         || q.isEmpty())
         return;

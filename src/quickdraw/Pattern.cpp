@@ -151,7 +151,7 @@ QBrush recolourBrush(const QBrush& brush, const QColor& ink, const QColor& paper
 
 namespace {
 
-const QBrush& resolveCached(QtGrafPort::BrushCache& cache, UInt32 serial, const QBrush& source,
+const QBrush& resolveCached(QtGrafPortPrivate::BrushCache& cache, UInt32 serial, const QBrush& source,
                             const QColor& ink, const QColor& paper, bool transparentPaper,
                             Qt::GlobalColor solidKey, const QColor& solidColor)
 {
@@ -178,13 +178,13 @@ const QBrush& resolveCached(QtGrafPort::BrushCache& cache, UInt32 serial, const 
 const QBrush& resolveFillBrush(QtGrafPort* port)
 {
     const QColor ink = port->foreColor();
-    return resolveCached(port->fillCache, port->inkSerial, port->currentBrush(), ink,
+    return resolveCached(portData(port)->fillCache, portData(port)->inkSerial, port->currentBrush(), ink,
                          port->backColor, port->penMode == patOr, Qt::black, ink);
 }
 
 const QBrush& resolveBackgroundBrush(QtGrafPort* port)
 {
-    return resolveCached(port->backCache, port->inkSerial, port->currentBackground(),
+    return resolveCached(portData(port)->backCache, portData(port)->inkSerial, port->currentBackground(),
                          port->foreColor(), port->backColor, false, Qt::white, port->backColor);
 }
 

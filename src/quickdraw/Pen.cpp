@@ -3,6 +3,7 @@
 #include <Velmar/QuickDraw.h>
 
 #include "quickdraw/PortPainter.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 
 namespace Velmar {
@@ -14,7 +15,7 @@ namespace {
 void applyPenMode(QtGrafPort* port, SInt16 mode)
 {
     port->penMode = mode;
-    port->inkChanged();
+    portData(port)->inkChanged();
     port->setCompositionMode(compositionModeForPenMode(mode));
 }
 
@@ -22,21 +23,21 @@ void applyPenMode(QtGrafPort* port, SInt16 mode)
 
 void PenPat(const PatPtr& pattern)
 {
-    QtGrafPort* port = shapePort("warning: PenPat: Can't get current port !");
+    CurrentPort port("PenPat");
     if (port && pattern.brush())
         port->setBrush(*pattern.brush());
 }
 
 void BackPat(const PatPtr& pattern)
 {
-    QtGrafPort* port = shapePort("warning: BackPat: Can't get current port !");
+    CurrentPort port("BackPat");
     if (port && pattern.brush())
         port->setBackground(*pattern.brush());
 }
 
 void PenSize(SInt16 width, SInt16 height)
 {
-    QtGrafPort* port = shapePort("warning: PenSize: Can't get current port !");
+    CurrentPort port("PenSize");
     if (!port)
         return;
     const QPen& current = port->currentPen();
@@ -58,14 +59,14 @@ void PenSize(SInt16 width, SInt16 height)
 
 void PenMode(SInt16 mode)
 {
-    QtGrafPort* port = shapePort("warning: PenMode: Can't get current port !");
+    CurrentPort port("PenMode");
     if (port)
         applyPenMode(port, mode);
 }
 
 void PenNormal()
 {
-    QtGrafPort* port = shapePort("warning: PenNormal: Can't get current port !");
+    CurrentPort port("PenNormal");
     if (!port)
         return;
     applyPenMode(port, patCopy);
@@ -76,12 +77,12 @@ void PenNormal()
 
 void HidePen()
 {
-    QtGrafPort* port = shapePort("warning: HidePen: Can't get current port !");
+    CurrentPort port("HidePen");
     if (!port)
         return;
     if (port->penVisibility-- == 0) {
-        port->savedPen = port->currentPen();
-        QPen hidden = port->savedPen;
+        portData(port)->savedPen = port->currentPen();
+        QPen hidden = portData(port)->savedPen;
         hidden.setStyle(Qt::NoPen); // keeps the colour: it is the foreground colour
         port->setPen(hidden);
     }
@@ -89,11 +90,11 @@ void HidePen()
 
 void ShowPen()
 {
-    QtGrafPort* port = shapePort("warning: ShowPen: Can't get current port !");
+    CurrentPort port("ShowPen");
     if (!port)
         return;
     if (++port->penVisibility == 0) {
-        QPen restored = port->savedPen;
+        QPen restored = portData(port)->savedPen;
         // A colour set while hidden stays.
         restored.setColor(port->foreColor());
         port->setPen(restored);
@@ -102,7 +103,7 @@ void ShowPen()
 
 void GetPen(Point* location)
 {
-    QtGrafPort* port = shapePort("warning: GetPen: Can't get current port !");
+    CurrentPort port("GetPen");
     if (!port || !location)
         return;
     location->v = static_cast<SInt16>(port->penY);
@@ -111,7 +112,7 @@ void GetPen(Point* location)
 
 void SetPenStyle(int style)
 {
-    QtGrafPort* port = shapePort("warning: SetPenStyle: Can't get current port !");
+    CurrentPort port("SetPenStyle");
     if (!port)
         return;
     QPen pen = port->currentPen();
@@ -121,13 +122,13 @@ void SetPenStyle(int style)
 
 int GetPenStyle()
 {
-    QtGrafPort* port = shapePort("warning: GetPenStyle: Can't get current port !");
+    CurrentPort port("GetPenStyle");
     return port ? static_cast<int>(port->currentPen().style()) : static_cast<int>(Qt::SolidLine);
 }
 
 void GetPenState(PenState* state)
 {
-    QtGrafPort* port = shapePort("warning: GetPenState: Can't get current port !");
+    CurrentPort port("GetPenState");
     if (!port || !state)
         return;
     state->setPenLocation(QPoint(port->penX, port->penY));
@@ -138,7 +139,7 @@ void GetPenState(PenState* state)
 
 void SetPenState(const PenState* state)
 {
-    QtGrafPort* port = shapePort("warning: SetPenState: Can't get current port !");
+    CurrentPort port("SetPenState");
     if (!port || !state)
         return;
     port->penX = state->penLocation().x();

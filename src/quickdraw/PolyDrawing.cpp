@@ -4,6 +4,8 @@
 #include <Velmar/QuickDraw.h>
 
 #include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/PolyHandles.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 #include "quickdraw/ShapeRecording.h"
@@ -17,12 +19,14 @@ using namespace Private;
 
 namespace {
 
+// A null polygon is a warning; a killed or made-up one an assertion.
 bool usable(PolyPtr* poly, const char* warning)
 {
-    if (poly && poly->qPoly)
-        return true;
-    shapeWarning(warning);
-    return false;
+    if (!poly) {
+        shapeWarning(warning);
+        return false;
+    }
+    return VELMAR_CHECK_POLY(poly);
 }
 
 // Fewer than three points enclose nothing, so the fill forms draw nothing for them.
@@ -40,12 +44,11 @@ void fillPoly(const char* caller, const char* warning, SInt16 verb, PolyPtr* pol
 
 void FramePoly(PolyPtr* poly)
 {
-    QtGrafPort* port = shapePort("warning: FramePoly: cannot get current port");
+    CurrentPort port("FramePoly");
     if (!port)
         return;
     if (port->definingRgn) {
-        VELMAR_ASSERT(poly && poly->qPoly, "FramePoly needs a polygon");
-        if (poly && poly->qPoly)
+        if (VELMAR_ASSERT(poly, "poly && poly->qPoly") && VELMAR_CHECK_POLY(poly))
             recordFrameShape(port, polygonRegion(*poly->qPoly));
         return;
     }

@@ -2,22 +2,31 @@
 #include <Velmar/Diagnostics.h>
 #include <Velmar/QDShapes.h>
 
-#include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/CurrentPort.h"
+#include "quickdraw/PolyHandles.h"
 #include "quickdraw/ShapeLog.h"
-#include "quickdraw/ShapeRecording.h"
 
 #include <QPolygon>
 
 namespace Velmar {
 
-namespace {
+namespace Private {
 
 PolyPtr* newPoly()
 {
-    return new PolyPtr{new QPolygon};
+    auto* poly = new PolyPtr{new QPolygon};
+    LiveHandles<PolyPtr>::instance().add(poly);
+    return poly;
 }
 
-} // namespace
+void freePoly(PolyPtr* poly)
+{
+    LiveHandles<PolyPtr>::instance().remove(poly);
+    delete poly->qPoly;
+    delete poly;
+}
+
+} // namespace Private
 
 // Misuse never hands out null: without a port, or while a region is being defined, the
 // caller gets a polygon that records nothing. A nested OpenPoly closes the first polygon
@@ -25,15 +34,14 @@ PolyPtr* newPoly()
 PolyPtr* OpenPoly()
 {
     QtGrafPort* port = Private::currentGrafPort();
-    VELMAR_ASSERT(!!port, "OpenPoly needs a current port");
-    if (!port)
-        return newPoly();
-    VELMAR_ASSERT(port->definingRgn == false, "OpenPoly while a region is being defined");
-    VELMAR_ASSERT(port->definingPoly == false, "OpenPoly while a polygon is open");
-    VELMAR_ASSERT(port->polySave == NULL, "OpenPoly while a polygon is recorded");
+    if (!VELMAR_ASSERT(port, "!!port"))
+        return Private::newPoly();
+    VELMAR_ASSERT(port->definingRgn == false, "port->definingRgn == false");
+    VELMAR_ASSERT(port->definingPoly == false, "port->definingPoly == false");
+    VELMAR_ASSERT(port->polySave == nullptr, "port->polySave == NULL");
     if (port->definingRgn)
-        return newPoly();
-    PolyPtr* poly = newPoly();
+        return Private::newPoly();
+    PolyPtr* poly = Private::newPoly();
     port->definingPoly = 1;
     port->polySave = poly;
     return poly;
@@ -41,11 +49,9 @@ PolyPtr* OpenPoly()
 
 void ClosePoly()
 {
-    QtGrafPort* port = Private::currentGrafPort();
-    if (!port) {
-        Private::shapeWarning("warning: ClosePoly: cannot get current port");
+    Private::CurrentPort port("ClosePoly");
+    if (!port)
         return;
-    }
     if (!port->definingPoly) {
         Private::shapeWarning("warning: ClosePoly: no polygon is open");
         return;

@@ -2,7 +2,9 @@
 #include <Velmar/Diagnostics.h>
 #include <Velmar/QtGrafPort.h>
 
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/PortPainter.h"
+#include "quickdraw/RegionHandles.h"
 
 namespace Velmar {
 
@@ -11,10 +13,10 @@ namespace Private {
 QPainter* startPortPainter(QtGrafPort* port, const char* caller)
 {
     if (!port) {
-        VelmarLog(kLogQuickDraw, "warning: %s: Can't get current port!", caller ? caller : "");
+        warnNoCurrentPort(caller);
         return nullptr;
     }
-    if (port->isActive())
+    if (painterRuns(port))
         return port->painter;
     const PortWindowHooks& hooks = portWindowHooks();
     if (port->window && hooks.isDirectDrawing && hooks.isDirectDrawing(port->window)) {
@@ -22,7 +24,7 @@ QPainter* startPortPainter(QtGrafPort* port, const char* caller)
         return nullptr;
     }
     port->BeginPaint();
-    return port->isActive() ? port->painter : nullptr;
+    return painterRuns(port) ? port->painter : nullptr;
 }
 
 } // namespace Private
@@ -34,9 +36,12 @@ MakeQPainter::MakeQPainter(const char* caller)
 {
 }
 
+// A port given explicitly may be stale: it is checked before anything reads it.
 MakeQPainter::MakeQPainter(GrafPtr port, const char* caller)
-    : m_port(port), m_painter(portPainter(port, caller))
+    : m_port(port), m_painter(nullptr)
 {
+    if (!port || VELMAR_CHECK_PORT(port, nullptr))
+        m_painter = portPainter(port, caller);
 }
 
 void MakeQPainter::report()
@@ -52,16 +57,42 @@ SavePortVisibleRegion::SavePortVisibleRegion()
         m_clip = m_port->clipRegion;
         m_clipInForce = m_port->clipInForce;
     }
+    lendRegions();
+}
+
+SavePortVisibleRegion::SavePortVisibleRegion(const SavePortVisibleRegion& other)
+    : m_port(other.m_port), m_visible(other.m_visible), m_clip(other.m_clip),
+      m_clipInForce(other.m_clipInForce)
+{
+    lendRegions();
+}
+
+SavePortVisibleRegion& SavePortVisibleRegion::operator=(const SavePortVisibleRegion& other)
+{
+    m_port = other.m_port;
+    m_visible = other.m_visible;
+    m_clip = other.m_clip;
+    m_clipInForce = other.m_clipInForce;
+    return *this;
 }
 
 SavePortVisibleRegion::~SavePortVisibleRegion()
 {
+    unregisterRegion(&m_visible);
+    unregisterRegion(&m_clip);
     if (!isLivePort(m_port))
         return;
     m_port->visibleRegion = m_visible;
     m_port->clipRegion = m_clip;
     m_port->clipInForce = m_clipInForce;
     m_port->updateEffectiveClip();
+}
+
+// The saved regions are handed to the host as region handles, so they count as live.
+void SavePortVisibleRegion::lendRegions()
+{
+    registerRegion(&m_visible);
+    registerRegion(&m_clip);
 }
 
 } // namespace Velmar

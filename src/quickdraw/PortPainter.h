@@ -17,16 +17,16 @@ QPainter* startPortPainter(QtGrafPort* port, const char* caller);
 // painter cannot start. A null port logs "warning: <caller>: Can't get current port!".
 inline QPainter* portPainter(QtGrafPort* port, const char* caller)
 {
-    if (port && port->isActive())
+    if (port && painterRuns(port))
         return port->painter;
     return startPortPainter(port, caller);
 }
 
 // A port's cached brush while its ink is unchanged, else `resolve(port)` (which refills it).
-inline const QBrush& cachedBrush(QtGrafPort* port, const QtGrafPort::BrushCache& cache,
+inline const QBrush& cachedBrush(QtGrafPort* port, const QtGrafPortPrivate::BrushCache& cache,
                                  const QBrush& (*resolve)(QtGrafPort*))
 {
-    if (cache.valid && cache.serial == port->inkSerial)
+    if (cache.valid && cache.serial == portData(port)->inkSerial)
         return cache.result;
     return resolve(port);
 }
@@ -37,13 +37,13 @@ inline const QBrush& cachedBrush(QtGrafPort* port, const QtGrafPort::BrushCache&
 const QBrush& resolveFillBrush(QtGrafPort* port);
 inline const QBrush& resolvedFillBrush(QtGrafPort* port)
 {
-    return cachedBrush(port, port->fillCache, resolveFillBrush);
+    return cachedBrush(port, portData(port)->fillCache, resolveFillBrush);
 }
 // The brush Erase operations and ScrollRect use: the background pattern in the back colour.
 const QBrush& resolveBackgroundBrush(QtGrafPort* port);
 inline const QBrush& resolvedBackgroundBrush(QtGrafPort* port)
 {
-    return cachedBrush(port, port->backCache, resolveBackgroundBrush);
+    return cachedBrush(port, portData(port)->backCache, resolveBackgroundBrush);
 }
 // A given pattern resolved like the fill brush (FillRect and friends).
 QBrush resolvedPatternBrush(QtGrafPort* port, const QBrush& pattern);

@@ -1,8 +1,9 @@
 // Region set algebra, translation, whole-pixel insetting and rectangle-to-rectangle mapping.
 #include <Velmar/QDRegions.h>
 
-#include "quickdraw/RegionOps.h"
 #include "foundation/Conversions.h"
+#include "quickdraw/RegionHandles.h"
+#include "quickdraw/RegionOps.h"
 #include "quickdraw/ShapeLog.h"
 
 #include <QRegion>
@@ -20,7 +21,8 @@ void combine(RgnHandle a, RgnHandle b, RgnHandle dst, Op op)
 {
     if (!dst || !a || !b)
         return;
-    *dst = op(*a, *b);
+    if (VELMAR_CHECK_REGION(a) && VELMAR_CHECK_REGION(b) && VELMAR_CHECK_REGION(dst))
+        *dst = op(*a, *b);
 }
 
 } // namespace
@@ -47,19 +49,19 @@ void XorRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
 
 void OffsetRgn(RgnHandle rgn, short dh, short dv)
 {
-    if (rgn)
+    if (VELMAR_CHECK_REGION(rgn))
         rgn->translate(dh, dv);
 }
 
 void InsetRgn(RgnHandle rgn, short dh, short dv)
 {
-    if (rgn)
+    if (VELMAR_CHECK_REGION(rgn))
         *rgn = Private::insetRegion(*rgn, dh, dv);
 }
 
 void MapRgn(RgnHandle rgn, const Rect* src, const Rect* dst)
 {
-    if (!rgn)
+    if (!VELMAR_CHECK_REGION(rgn))
         return;
     if (!src || !dst) {
         Private::shapeWarning("warning: MapRgn: null rectangle");

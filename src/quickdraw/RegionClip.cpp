@@ -4,6 +4,8 @@
 
 #include "foundation/Conversions.h"
 #include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/RegionHandles.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 
 #include <QGuiApplication>
@@ -16,31 +18,34 @@ using namespace Private;
 // The port's stored clip, in force or not; a fresh port's is the wide-open rectangle.
 void GetClip(RgnHandle rgn)
 {
-    QtGrafPort* port = shapePort("warning: GetClip: cannot get current port");
-    if (port && given(rgn, "warning: GetClip: null region"))
+    CurrentPort port("GetClip");
+    if (port && given(rgn, "warning: GetClip: null region") && VELMAR_CHECK_REGION(rgn))
         *rgn = port->clipRegion;
 }
 
 void SetClip(RgnHandle rgn)
 {
-    QtGrafPort* port = shapePort("warning: SetClip: cannot get current port");
-    if (port && given(rgn, "warning: SetClip: null region"))
-        SetPortClipRegion(port, rgn);
+    CurrentPort port("SetClip");
+    if (port && given(rgn, "warning: SetClip: null region") && VELMAR_CHECK_REGION(rgn))
+        setPortClip(port, *rgn);
 }
 
 void ClipRect(const Rect* r)
 {
-    QtGrafPort* port = shapePort("warning: ClipRect: cannot get current port");
-    if (port && given(r, "warning: ClipRect: null rectangle")) {
-        QRegion region(toQRect(r));
-        SetPortClipRegion(port, &region);
-    }
+    CurrentPort port("ClipRect");
+    if (port && given(r, "warning: ClipRect: null rectangle"))
+        setPortClip(port, QRegion(toQRect(r)));
 }
 
-// Recomputed at every call so that screens coming and going are seen.
+// Recomputed at every call so that screens coming and going are seen. The region belongs to
+// the library and stays live for the whole process.
 RgnHandle GetGrayRgn()
 {
-    static QRegion gray;
+    static QRegion& gray = *[] {
+        auto* region = new QRegion;
+        registerRegion(region);
+        return region;
+    }();
     gray = QRegion();
     if (qobject_cast<QGuiApplication*>(QCoreApplication::instance())) {
         const QList<QScreen*> screens = QGuiApplication::screens();

@@ -4,6 +4,8 @@
 #include <Velmar/QuickDraw.h>
 
 #include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/CurrentPort.h"
+#include "quickdraw/RegionHandles.h"
 #include "quickdraw/RegionHilite.h"
 #include "quickdraw/RegionOps.h"
 #include "quickdraw/ShapeLog.h"
@@ -16,27 +18,27 @@ using namespace Private;
 
 void PaintRgn(RgnHandle rgn)
 {
-    if (rgn)
+    if (VELMAR_CHECK_REGION(rgn))
         fillShapeRegion("PaintRgn", kQDGrafVerbPaint, *rgn);
 }
 
 void EraseRgn(RgnHandle rgn)
 {
-    if (rgn)
+    if (VELMAR_CHECK_REGION(rgn))
         fillShapeRegion("EraseRgn", kQDGrafVerbErase, *rgn);
 }
 
 void FillRgn(RgnHandle rgn, const PatPtr& pattern)
 {
-    if (rgn)
+    if (VELMAR_CHECK_REGION(rgn))
         fillShapeRegion("FillRgn", kQDGrafVerbFill, *rgn, &pattern);
 }
 
 // The frame is the region minus the region inset by the pen width both ways, painted.
 void FrameRgn(RgnHandle rgn)
 {
-    QtGrafPort* port = shapePort("warning: FrameRgn: cannot get current port");
-    if (!port || !rgn || recordFrameShape(port, *rgn))
+    CurrentPort port("FrameRgn");
+    if (!port || !VELMAR_CHECK_REGION(rgn) || recordFrameShape(port, *rgn))
         return;
     const int w = penPixelWidth(port->currentPen());
     if (w == 0 || rgn->isEmpty())
@@ -46,7 +48,7 @@ void FrameRgn(RgnHandle rgn)
 
 void InvertRgn(RgnHandle rgn)
 {
-    if (!rgn)
+    if (!VELMAR_CHECK_REGION(rgn))
         return;
     MakeQPainter painter("InvertRgn");
     if (!painter)

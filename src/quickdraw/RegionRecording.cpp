@@ -4,6 +4,9 @@
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
 
+#include "quickdraw/CurrentPort.h"
+#include "quickdraw/PolyHandles.h"
+#include "quickdraw/RegionHandles.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapeRecording.h"
 
@@ -15,38 +18,47 @@ using namespace Private;
 
 void OpenRgn()
 {
-    QtGrafPort* port = shapePort("warning: OpenRgn: cannot get current port");
+    CurrentPort port("OpenRgn");
     if (!port)
         return;
-    VELMAR_ASSERT(port->definingPoly == false, "OpenRgn while a polygon is open");
-    VELMAR_ASSERT(port->definingRgn == false, "OpenRgn while a region is being defined");
-    VELMAR_ASSERT(port->rgnSave == NULL, "OpenRgn while a region is recorded");
+    VELMAR_ASSERT(port->definingPoly == false, "port->definingPoly == false");
+    VELMAR_ASSERT(port->definingRgn == false, "port->definingRgn == false");
+    VELMAR_ASSERT(port->rgnSave == nullptr, "port->rgnSave == NULL");
     // After a misuse the port starts afresh: an earlier region is dropped, an open polygon
     // is let go (it belongs to its caller).
     discardRecording(port);
     port->rgnSave = new QRegion;
-    port->polySave = new PolyPtr{new QPolygon};
+    port->polySave = newPoly();
     port->definingRgn = 1;
 }
+
+namespace {
+
+void closeRegion(QtGrafPort* port, QRegion& out)
+{
+    VELMAR_ASSERT(port->definingRgn == true, "port->definingRgn == true");
+    VELMAR_ASSERT(port->definingPoly == false, "port->definingPoly == false");
+    VELMAR_ASSERT(port->rgnSave, "port->rgnSave");
+    VELMAR_ASSERT(port->polySave && port->polySave->qPoly,
+                  "port->polySave && port->polySave->qPoly");
+    if (!port->definingRgn || !port->rgnSave)
+        return;
+    if (port->polySave && port->polySave->qPoly && port->polySave->qPoly->size() > 2)
+        *port->rgnSave ^= polygonRegion(*port->polySave->qPoly);
+    out = *port->rgnSave;
+    discardRecording(port);
+}
+
+} // namespace
 
 // A null destination leaves the region open, deliberately.
 void CloseRgn(RgnHandle dst)
 {
     if (!dst)
         return;
-    QtGrafPort* port = shapePort("warning: CloseRgn: cannot get current port");
-    if (!port)
-        return;
-    VELMAR_ASSERT(port->definingRgn == true, "CloseRgn without OpenRgn");
-    VELMAR_ASSERT(port->definingPoly == false, "CloseRgn while a polygon is open");
-    VELMAR_ASSERT(port->rgnSave, "CloseRgn without a recorded region");
-    VELMAR_ASSERT(port->polySave && port->polySave->qPoly, "CloseRgn without a recorded polygon");
-    if (!port->definingRgn || !port->rgnSave)
-        return;
-    if (port->polySave && port->polySave->qPoly && port->polySave->qPoly->size() > 2)
-        *port->rgnSave ^= polygonRegion(*port->polySave->qPoly);
-    *dst = *port->rgnSave;
-    discardRecording(port);
+    CurrentPort port("CloseRgn");
+    if (port && VELMAR_CHECK_REGION(dst))
+        closeRegion(port, *dst);
 }
 
 CleanupOpenRgn::~CleanupOpenRgn()
@@ -54,7 +66,7 @@ CleanupOpenRgn::~CleanupOpenRgn()
     QtGrafPort* port = currentGrafPort();
     if (port && port->definingRgn) {
         QRegion scratch;
-        CloseRgn(&scratch);
+        closeRegion(port, scratch);
     }
 }
 

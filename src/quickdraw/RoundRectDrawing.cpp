@@ -4,6 +4,7 @@
 #include <Velmar/QuickDraw.h>
 
 #include "foundation/Conversions.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 
@@ -32,7 +33,7 @@ void fillRounded(const char* caller, SInt16 verb, const Rect* r, short ovalWidth
 void FrameRoundRect(const Rect* r, short ovalWidth, short ovalHeight)
 {
     const QRect q = toQRect(r);
-    if (!shapePort("warning: FrameRoundRect: cannot get current port") || q.isEmpty())
+    if (!CurrentPort("FrameRoundRect") || q.isEmpty())
         return;
     strokeShape("FrameRoundRect", q,
                 [&](QPainter* p) { drawRounded(p, q, ovalWidth, ovalHeight); });

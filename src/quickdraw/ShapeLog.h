@@ -5,17 +5,8 @@
 
 namespace Velmar::Private {
 
-// Writes a finished warning line ("warning: FrameRect: cannot get current port").
+// Writes a finished warning line ("warning: CopyRgn: null region").
 void shapeWarning(const char* text);
-
-// The current port, or null after writing `warning` (the call's "cannot get current port").
-inline QtGrafPort* shapePort(const char* warning)
-{
-    QtGrafPort* port = currentGrafPort();
-    if (!port)
-        shapeWarning(warning);
-    return port;
-}
 
 // True when the argument `p` is given; otherwise writes `warning` and gives false.
 inline bool given(const void* p, const char* warning)

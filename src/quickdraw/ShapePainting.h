@@ -68,7 +68,7 @@ void strokeShape(const char* caller, const QRect& shape, Draw draw)
     painter->setBrush(Qt::NoBrush);
     draw(static_cast<QPainter*>(painter));
     painter->setBrush(own);
-    painter |= shape.adjusted(-w, -w, w, w);
+    painter |= grownRect(shape, w);
 }
 
 // Runs `draw(QPainter*)` on the current port's painter with a verb's ink and no pen;

@@ -4,6 +4,7 @@
 #include <Velmar/QDShapes.h>
 
 #include "quickdraw/GrafPortPrivate.h"
+#include "quickdraw/PolyHandles.h"
 
 #include <QPolygon>
 
@@ -14,8 +15,7 @@ bool recordFrameShape(QtGrafPort* port, const QRegion& shape)
     if (!port || !port->definingRgn)
         return false;
     QRegion* saveRegion = port->rgnSave;
-    VELMAR_ASSERT(NULL != saveRegion, "a region is being defined without its region");
-    if (saveRegion)
+    if (VELMAR_ASSERT(saveRegion, "NULL != saveRegion"))
         *saveRegion ^= shape;
     return true;
 }
@@ -24,11 +24,11 @@ bool recordPenPoint(QtGrafPort* port, int h, int v)
 {
     if (!port || !(port->definingPoly || port->definingRgn))
         return false;
-    VELMAR_ASSERT(port->polySave, "a polygon or region is being defined without its polygon");
+    VELMAR_ASSERT(port->polySave, "port->polySave");
     PolyPtr* polySave = port->polySave;
-    VELMAR_ASSERT(polySave != NULL, "a polygon or region is being defined without its polygon");
+    VELMAR_ASSERT(polySave, "polySave != NULL");
     if (port->definingRgn)
-        VELMAR_ASSERT(port->rgnSave != NULL, "a region is being defined without its region");
+        VELMAR_ASSERT(port->rgnSave, "port->rgnSave != NULL");
     if (polySave && polySave->qPoly)
         polySave->qPoly->append(QPoint(h, v));
     return true;
@@ -38,10 +38,8 @@ void discardRecording(QtGrafPort* port)
 {
     if (!port)
         return;
-    if (port->definingRgn && port->polySave) {
-        delete port->polySave->qPoly;
-        delete port->polySave;
-    }
+    if (port->definingRgn && port->polySave)
+        freePoly(port->polySave);
     delete port->rgnSave;
     port->rgnSave = nullptr;
     port->polySave = nullptr;

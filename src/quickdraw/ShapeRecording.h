@@ -4,7 +4,7 @@
 
 #include <Velmar/QtGrafPort.h>
 
-#include "quickdraw/ShapeLog.h"
+#include "quickdraw/CurrentPort.h"
 
 namespace Velmar::Private {
 
@@ -12,12 +12,13 @@ namespace Velmar::Private {
 // true (the caller then draws nothing). Otherwise returns false.
 bool recordFrameShape(QtGrafPort* port, const QRegion& shape);
 
-// The current port to draw a frame on. Null when there is none (after writing `warning`) and
-// when the port defines a region: `shape()` is then XORed into the region instead of drawn.
+// The current port to draw a frame on. Null when there is none (after the call's warning)
+// and when the port defines a region: `shape()` is then XORed into the region instead of
+// drawn.
 template <typename Shape>
-QtGrafPort* framingPort(const char* warning, Shape shape)
+QtGrafPort* framingPort(const char* call, Shape shape)
 {
-    QtGrafPort* port = shapePort(warning);
+    QtGrafPort* port = CurrentPort(call);
     if (port && port->definingRgn) {
         recordFrameShape(port, shape());
         return nullptr;

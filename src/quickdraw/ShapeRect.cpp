@@ -5,6 +5,7 @@
 
 #include "foundation/Conversions.h"
 #include "quickdraw/RegionOps.h"
+#include "quickdraw/CurrentPort.h"
 #include "quickdraw/ShapeLog.h"
 #include "quickdraw/ShapePainting.h"
 #include "quickdraw/ShapeRecording.h"
@@ -31,7 +32,7 @@ void FrameRect(const Rect* r)
     const QRect q = toQRect(r);
     // The region is built only while recording, so that drawing a frame allocates nothing.
     QtGrafPort* port =
-        framingPort("warning: FrameRect: cannot get current port", [&q] { return QRegion(q); });
+        framingPort("FrameRect", [&q] { return QRegion(q); });
     if (!port)
         return;
     MakeQPainter painter(port, "FrameRect");
@@ -99,7 +100,7 @@ void StdRect(SInt16 verb, const Rect* r)
 {
     using Draw = void (*)(const Rect*);
     static constexpr Draw kByVerb[] = {FrameRect, PaintRect, EraseRect, InvertRect, PaintRect};
-    if (!shapePort("warning: StdRect: cannot get current port"))
+    if (!CurrentPort("StdRect"))
         return;
     if (verb < 0 || verb >= SInt16(std::size(kByVerb))) {
         shapeWarning("warning: StdRect: unknown verb");

@@ -59,7 +59,8 @@ QString ScriptedAutomationListener::AnswerDialog(const QString& title, const QSt
 }
 
 ModalActor::ModalActor(std::function<void(QWidget* modal)> act)
-    : m_act(std::move(act)), m_context(new QObject), m_thread(new QThread)
+    : m_act(std::move(act)), m_context(new QObject), m_thread(new QThread),
+      m_previousListener(Velmar::AutomationListenerManager::SetListener(nullptr))
 {
     // The clock ticks in its own thread and calls back through queued calls: the
     // application postpones GUI-thread timers while Carbon events are blocked (as they are
@@ -80,6 +81,7 @@ ModalActor::~ModalActor()
     m_thread->wait();
     delete m_thread;
     delete m_context; // drops calls still queued
+    Velmar::AutomationListenerManager::SetListener(m_previousListener);
 }
 
 void ModalActor::poll()
@@ -100,6 +102,86 @@ void ModalActor::poll()
         modal->close();
     }
     m_done = m_acted || givingUp;
+}
+
+QString assertionText(const QString& dialogText)
+{
+    QString first = dialogText.section(u'\n', 0, 0);
+    if (first.startsWith(QLatin1String("velmar_assert: ")))
+        first.remove(0, int(qstrlen("velmar_assert: ")));
+    return first;
+}
+
+namespace {
+
+class UnexpectedAssertionGuard : public Velmar::AutomationListener {
+public:
+    QString AnswerDialog(const QString& title, const QString& text,
+                         const QString& choices) override
+    {
+        if (title == QLatin1String("Velmar assert")) {
+            const QByteArray what = "unexpected assertion: " + text.toLocal8Bit();
+            if (QTest::currentTestFunction())
+                QTest::qFail(what.constData(), __FILE__, __LINE__);
+            else
+                qWarning("%s", what.constData());
+            return QStringLiteral("Ignore");
+        }
+        return choices.section(u'|', -1);
+    }
+};
+
+} // namespace
+
+void installUnexpectedAssertionGuard()
+{
+    static UnexpectedAssertionGuard sGuard;
+    Velmar::AutomationListenerManager::SetListener(&sGuard);
+}
+
+void SequenceRecorder::recordOnce(const QString& entry)
+{
+    if (m_entries.isEmpty() || m_entries.last() != entry)
+        m_entries << entry;
+}
+
+namespace {
+
+// Whether actual[a..] fits expected[e..]; small lists, so plain backtracking.
+bool fits(const QStringList& expected, qsizetype e, const QStringList& actual, qsizetype a)
+{
+    if (e == expected.size())
+        return a == actual.size();
+    const QString& want = expected[e];
+    if (want == u'*') {
+        for (qsizetype skip = a; skip <= actual.size(); ++skip) {
+            if (fits(expected, e + 1, actual, skip))
+                return true;
+        }
+        return false;
+    }
+    if (want.startsWith(u'?')) {
+        if (a < actual.size() && actual[a] == want.mid(1) && fits(expected, e + 1, actual, a + 1))
+            return true;
+        return fits(expected, e + 1, actual, a);
+    }
+    return a < actual.size() && actual[a] == want && fits(expected, e + 1, actual, a + 1);
+}
+
+} // namespace
+
+QString SequenceRecorder::mismatch(const QString& name, const QStringList& expected,
+                                   const QStringList& actual)
+{
+    if (fits(expected, 0, actual, 0))
+        return QString();
+    QString text = QStringLiteral("sequence \"%1\" does not fit\n  expected:").arg(name);
+    for (const QString& e : expected)
+        text += QStringLiteral("\n    ") + e;
+    text += QStringLiteral("\n  actual:");
+    for (const QString& e : actual)
+        text += QStringLiteral("\n    ") + e;
+    return text;
 }
 
 void isolateSettings()

@@ -68,9 +68,10 @@ private:
     Velmar::AutomationListener* m_previous = nullptr;
 };
 
-// For tests that show a real modal box: while it lives, polls for the active modal widget
-// and hands the first one to `act` (which clicks or closes it). If `act` leaves it open, or
-// nothing acts within ~5 s, the widget is closed anyway so that no test can hang on a box.
+// For tests that show a real modal box: while it lives, no automation listener answers (so
+// the library shows its real dialogs), and it polls for the active modal widget and hands
+// the first one to `act` (which clicks or closes it). If `act` leaves it open, or nothing
+// acts within ~5 s, the widget is closed anyway so that no test can hang on a box.
 class ModalActor {
 public:
     explicit ModalActor(std::function<void(QWidget* modal)> act);
@@ -89,13 +90,72 @@ private:
     bool m_acted = false;
     bool m_done = false;
     int m_attempts = 0;
+    Velmar::AutomationListener* m_previousListener = nullptr;
 };
 
 // Points QSettings at a private temporary directory so tests never touch the user's
 // real settings. Call before any QSettings object exists (the test main macros do).
 void isolateSettings();
 
+// The text an assertion dialog stands for: its first line without "velmar_assert: " (the
+// message when one was given, otherwise the assertion text).
+QString assertionText(const QString& dialogText);
+
+// Installed by the test mains underneath every other listener: an assertion nothing in the
+// test was waiting for fails the running test function (it is answered "Ignore", so the
+// code under test goes on) instead of opening a box that nobody answers. Other dialogs are
+// answered with their last choice ("Cancel" and the like).
+void installUnexpectedAssertionGuard();
+
+// Sets a replaceable hook or service for one scope and puts back what it replaced. Works
+// with every setter that returns the previous value: SetWindowEventHooks, setPortWindowHooks,
+// SetTickSource, SetRepaintDirtyPortsHook ...
+//     VelmarTest::ScopedOverride ticks(&Velmar::SetTickSource, fixedTicks);
+template <typename Value, typename Argument>
+class ScopedOverride {
+public:
+    ScopedOverride(Value (*set)(Argument), Value value) : m_set(set), m_previous(set(value)) {}
+    ~ScopedOverride() { m_set(m_previous); }
+    ScopedOverride(const ScopedOverride&) = delete;
+    ScopedOverride& operator=(const ScopedOverride&) = delete;
+    const Value& previous() const { return m_previous; }
+
+private:
+    Value (*m_set)(Argument);
+    Value m_previous;
+};
+
+// What happened, in order (events received, handlers called, assertions raised), compared
+// with a named expected sequence. In an expected sequence an entry starting with "?" may
+// be absent, and "*" stands for any run of entries (none included). On a mismatch both
+// sequences are printed whole.
+class SequenceRecorder {
+public:
+    void record(const QString& entry) { m_entries << entry; }
+    // Skips an entry that repeats the last one: a run of identical calls shows once, however
+    // often a Qt loop spun meanwhile.
+    void recordOnce(const QString& entry);
+    const QStringList& entries() const { return m_entries; }
+    void clear() { m_entries.clear(); }
+
+    // Empty when `actual` fits `expected`, otherwise the whole story for a failure message.
+    static QString mismatch(const QString& name, const QStringList& expected,
+                            const QStringList& actual);
+
+private:
+    QStringList m_entries;
+};
+
 } // namespace VelmarTest
+
+// Fails the test unless what `recorder` saw fits the named expected sequence.
+#define VELMAR_COMPARE_SEQUENCE(recorder, name, ...)                                        \
+    do {                                                                                    \
+        const QString velmarWhy = VelmarTest::SequenceRecorder::mismatch(                   \
+            (name), QStringList(__VA_ARGS__), (recorder).entries());                       \
+        if (!velmarWhy.isEmpty())                                                           \
+            QFAIL(qPrintable(velmarWhy));                                                   \
+    } while (0)
 
 // A QtTest main that isolates settings first, then runs TestObject under a QApplication.
 #define VELMAR_TEST_MAIN(TestObject)                                                        \
@@ -103,6 +163,7 @@ void isolateSettings();
     {                                                                                       \
         VelmarTest::isolateSettings();                                                      \
         QApplication app(argc, argv);                                                       \
+        VelmarTest::installUnexpectedAssertionGuard();                                      \
         TestObject tc;                                                                      \
         QTEST_SET_MAIN_SOURCE_PATH                                                          \
         return QTest::qExec(&tc, argc, argv);                                               \
@@ -115,6 +176,7 @@ void isolateSettings();
     {                                                                                       \
         VelmarTest::isolateSettings();                                                      \
         Velmar::AQtApplication app(argc, argv, false);                                      \
+        VelmarTest::installUnexpectedAssertionGuard();                                      \
         TestObject tc;                                                                      \
         QTEST_SET_MAIN_SOURCE_PATH                                                          \
         return QTest::qExec(&tc, argc, argv);                                               \

@@ -83,7 +83,7 @@ public:
     ~AssertRecorder() override { Velmar::AutomationListenerManager::SetListener(m_previous); }
     QString AnswerDialog(const QString&, const QString& text, const QString&) override
     {
-        log() << QStringLiteral("assert: ") + text.section(u'\n', 0, 0);
+        log() << QStringLiteral("assert: ") + VelmarTest::assertionText(text);
         return QStringLiteral("Ignore");
     }
 

@@ -260,7 +260,7 @@ private Q_SLOTS:
         // Removing it again is reported and otherwise harmless.
         QCOMPARE(RemoveEventHandler(stale), OSStatus(noErr));
         QCOMPARE(m_listener->count(), 1);
-        QVERIFY(m_listener->questions()[0].text.contains("count > 0"));
+        QVERIFY(m_listener->questions()[0].text.contains("IsValidEventHandler(inHandlerRef)"));
         QCOMPARE(RemoveEventHandler(nullptr), OSStatus(paramErr));
         QCOMPARE(m_listener->count(), 1);
         Private::DispatchEventToCallbacks(makeEvent(nullptr));

@@ -230,6 +230,8 @@ private Q_SLOTS:
     void automationListener()
     {
         const QString choices = QStringLiteral("Abort|Retry|Ignore|Ignore All");
+        VelmarTest::ScopedOverride none(&AutomationListenerManager::SetListener,
+                                        static_cast<AutomationListener*>(nullptr));
         QVERIFY(!AutomationListenerManager::GetListener());
         QCOMPARE(AskAutomationListener(QStringLiteral("t"), QStringLiteral("x"), choices), SInt32(-1));
 

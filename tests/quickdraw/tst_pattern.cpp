@@ -198,7 +198,7 @@ private Q_SLOTS:
         QPen green = world->painter->pen();
         green.setColor(QColor(kUnderneath));
         world->painter->setPen(green);
-        world->inkChanged();
+        Private::portData(world)->inkChanged();
         paint(world, QRect(1, 0, 1, 1));
         QCOMPARE(world.pixel(1, 0), kUnderneath);
         // Ending and restarting the painter keeps the resolved colours right.

@@ -164,9 +164,8 @@ private Q_SLOTS:
         const RGBColor red(65535, 0, 0);
         const Rect r = R(10, 20, 30, 60);
         const QRect q(20, 10, 40, 20), rq(30, 40, 20, 10), pq(10, 10, 31, 21);
-        QRegion region(rq);
-        QPolygon points({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
-        PolyPtr poly{&points};
+        const Rgn region = rgnOf(QRegion(rq));
+        PolyPtr* poly = recordPoly({QPoint(10, 10), QPoint(40, 10), QPoint(40, 30)});
         const QList<std::tuple<const char*, std::function<void()>, QRect, bool>> cases = {
             {"union of the named", [] { MakeQPainter p("test"); QVERIFY(!!p); p |= QRect(5, 5, 10, 10);
                                         p |= QRect(20, 5, 2, 2); }, QRect(5, 5, 17, 10), true},
@@ -182,11 +181,11 @@ private Q_SLOTS:
             {"FrameArc", [&] { FrameArc(&r, 0, 90); }, q, false},
             {"PaintRoundRect", [&] { PaintRoundRect(&r, 6, 6); }, q, false},
             {"LineTo", [&] { MoveTo(5, 70); LineTo(50, 60); }, QRect(5, 60, 46, 11), false},
-            {"PaintRgn", [&] { PaintRgn(&region); }, rq, false},
-            {"FrameRgn", [&] { FrameRgn(&region); }, rq, false},
-            {"InvertRgn", [&] { InvertRgn(&region); }, rq, false},
-            {"FramePoly", [&] { FramePoly(&poly); }, pq, false},
-            {"PaintPoly", [&] { PaintPoly(&poly); }, pq, false},
+            {"PaintRgn", [&] { PaintRgn(region.get()); }, rq, false},
+            {"FrameRgn", [&] { FrameRgn(region.get()); }, rq, false},
+            {"InvertRgn", [&] { InvertRgn(region.get()); }, rq, false},
+            {"FramePoly", [&] { FramePoly(poly); }, pq, false},
+            {"PaintPoly", [&] { PaintPoly(poly); }, pq, false},
         };
         for (const auto& [name, draw, expected, exact] : cases) {
             gDirty.clear();
@@ -199,6 +198,7 @@ private Q_SLOTS:
             else
                 QVERIFY2(dirty.contains(expected) && dirty.width() < 90 && dirty.height() < 90, name);
         }
+        KillPoly(poly);
         // A window port is not disposed through the offscreen calls.
         DisposePort(port);
         QVERIFY(IsValidPort(port));
@@ -264,8 +264,9 @@ private Q_SLOTS:
         const RGBColor back(0, 0, 65535);
         RGBBackColor(&back);
         const Rect r = makeRect(0, 0, 100, 100);
-        QRegion update;
-        ScrollRect(&r, 0, 10, &update);
+        const Rgn rgn = rgnOf();
+        QRegion& update = *rgn;
+        ScrollRect(&r, 0, 10, rgn.get());
         QCOMPARE(update, QRegion(QRect(0, 0, 100, 10)));
         for (int y = 10; y < 100; ++y)
             for (int x = 0; x < 100; x += 33)
@@ -276,7 +277,7 @@ private Q_SLOTS:
         // Left by 5 inside a sub-rectangle: columns outside it stay.
         const QRgb outside = world.pixel(80, 50);
         const Rect sub = makeRect(10, 20, 60, 70);
-        ScrollRect(&sub, -5, 0, &update);
+        ScrollRect(&sub, -5, 0, rgn.get());
         QCOMPARE(update, QRegion(QRect(55, 20, 5, 50)));
         QCOMPARE(world.pixel(10, 30), qRgb(20, 235, 15));
         QCOMPARE(world.pixel(54, 30), qRgb(20, 235, 59));
@@ -286,10 +287,10 @@ private Q_SLOTS:
 
         // No offset: empty update region, pixels untouched.
         update = QRegion(0, 0, 5, 5);
-        ScrollRect(&sub, 0, 0, &update);
+        ScrollRect(&sub, 0, 0, rgn.get());
         QVERIFY(update.isEmpty());
         // Scrolling by more than the rectangle erases all of it.
-        ScrollRect(&sub, 0, 200, &update);
+        ScrollRect(&sub, 0, 200, rgn.get());
         QCOMPARE(update, QRegion(QRect(10, 20, 50, 50)));
         QCOMPARE(world.pixel(30, 60), qRgb(0, 0, 255));
     }
@@ -298,8 +299,9 @@ private Q_SLOTS:
     {
         VelmarTest::ScriptedAutomationListener answers;
         World world(10);
-        QRegion update;
-        ScrollRect(nullptr, 1, 1, &update);
+        const Rgn rgn = rgnOf();
+        QRegion& update = *rgn;
+        ScrollRect(nullptr, 1, 1, rgn.get());
         const Rect r = makeRect(0, 0, 10, 10);
         ScrollRect(&r, 1, 1, nullptr);
         QCOMPARE(answers.questions().size(), 2);
@@ -307,17 +309,17 @@ private Q_SLOTS:
         QVERIFY(answers.questions().at(1).text.contains(QStringLiteral("NULL != updateRgn")));
         SetPort(nullptr);
         update = QRegion(0, 0, 3, 3);
-        ScrollRect(&r, 1, 1, &update);
+        ScrollRect(&r, 1, 1, rgn.get());
         QVERIFY(update.isEmpty());
     }
 
     void clipAndVisibleRegions()
     {
         World world(20);
-        QRegion rgn;
-        QCOMPARE(*GetPortVisibleRegion(world, &rgn), QRegion(QRect(0, 0, 20, 20)));
-        QRegion clip(QRect(5, 5, 5, 5));
-        SetPortClipRegion(world, &clip);
+        const Rgn rgn = rgnOf();
+        QCOMPARE(*GetPortVisibleRegion(world, rgn.get()), QRegion(QRect(0, 0, 20, 20)));
+        const QRegion clip(QRect(5, 5, 5, 5));
+        SetPortClipRegion(world, rgnOf(clip).get());
         QCOMPARE(world->clipInForce, UInt8(1));
         QPainter* p = world.painter();
         p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::red));
@@ -327,8 +329,7 @@ private Q_SLOTS:
         {
             SavePortVisibleRegion saved;
             QCOMPARE(*saved.clip(), clip);
-            QRegion visible(QRect(0, 0, 6, 6));
-            SetPortVisibleRegion(world, &visible);
+            SetPortVisibleRegion(world, rgnOf(QRegion(0, 0, 6, 6)).get());
             p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::blue));
             QCOMPARE(world.pixel(5, 5), qRgb(0, 0, 255));
             QCOMPARE(world.pixel(6, 6), qRgb(255, 0, 0));
@@ -338,9 +339,9 @@ private Q_SLOTS:
         p->fillRect(QRect(0, 0, 20, 20), QColor(Qt::green));
         QCOMPARE(world.pixel(9, 9), qRgb(0, 255, 0));
         QCOMPARE(world.pixel(4, 4), qRgb(255, 255, 255));
-        SetPortVisibleRegion(nullptr, &rgn);
+        SetPortVisibleRegion(nullptr, rgn.get());
         SetPortVisibleRegion(world, nullptr);
-        QCOMPARE(*GetPortClipRegion(world, &rgn), clip);
+        QCOMPARE(*GetPortClipRegion(world, rgn.get()), clip);
     }
 };
 

@@ -2,22 +2,29 @@
 #include <Velmar/QDRegions.h>
 
 #include "foundation/Conversions.h"
+#include "quickdraw/RegionHandles.h"
 #include "quickdraw/ShapeLog.h"
 
 #include <QRegion>
 
 namespace Velmar {
 
-using Private::toQRect;
 using Private::shapeWarning;
+using Private::toQRect;
 
 RgnHandle NewRgn()
 {
-    return new QRegion;
+    auto* region = new QRegion;
+    Private::registerRegion(region);
+    return region;
 }
 
+// A handle disposed twice, or never made by NewRgn, is refused and not freed.
 void DisposeRgn(RgnHandle rgn)
 {
+    if (!VELMAR_CHECK_REGION(rgn))
+        return;
+    Private::unregisterRegion(rgn);
     delete rgn;
 }
 
@@ -27,7 +34,7 @@ void CopyRgn(RgnHandle src, RgnHandle dst)
         shapeWarning("warning: CopyRgn: null region");
         return;
     }
-    if (src != dst)
+    if (VELMAR_CHECK_REGION(src) && VELMAR_CHECK_REGION(dst) && src != dst)
         *dst = *src;
 }
 
@@ -37,37 +44,33 @@ void SetEmptyRgn(RgnHandle rgn)
         shapeWarning("warning: SetEmptyRgn: null region");
         return;
     }
-    *rgn = QRegion();
+    if (VELMAR_CHECK_REGION(rgn))
+        *rgn = QRegion();
 }
 
 void RectRgn(RgnHandle rgn, const Rect* r)
 {
-    if (!rgn)
-        return;
     // An empty rectangle (left >= right or top >= bottom) gives the empty region.
-    *rgn = QRegion(toQRect(r));
+    if (VELMAR_CHECK_REGION(rgn))
+        *rgn = QRegion(toQRect(r));
 }
 
 void SetRectRgn(RgnHandle rgn, short left, short top, short right, short bottom)
 {
-    Rect r;
-    r.top = top;
-    r.left = left;
-    r.bottom = bottom;
-    r.right = right;
+    const Rect r = Private::makeRect(left, top, right, bottom);
     RectRgn(rgn, &r);
 }
 
 unsigned char PtInRgn(Point pt, RgnHandle rgn)
 {
-    if (!rgn)
+    if (!VELMAR_CHECK_REGION(rgn))
         return 0;
     return rgn->contains(Private::toQPoint(pt)) ? 1 : 0;
 }
 
 unsigned char RectInRgn(const Rect* r, RgnHandle rgn)
 {
-    if (!rgn || !r)
+    if (!VELMAR_CHECK_REGION(rgn) || !r)
         return 0;
     const QRect q = toQRect(r);
     if (!q.isValid())
@@ -82,16 +85,20 @@ unsigned char EqualRgn(RgnHandle a, RgnHandle b)
         shapeWarning("warning: EqualRgn: null region");
         return (!a && !b) ? 1 : 0;
     }
+    if (!VELMAR_CHECK_REGION(a) || !VELMAR_CHECK_REGION(b))
+        return 0;
     return *a == *b ? 1 : 0;
 }
 
-// A null handle counts as empty, as a null rectangle does.
+// A null handle counts as empty, as a null rectangle does; so does a stale one.
 unsigned char EmptyRgn(RgnHandle rgn)
 {
     if (!rgn) {
         shapeWarning("warning: EmptyRgn: null region");
         return 1;
     }
+    if (!VELMAR_CHECK_REGION(rgn))
+        return 1;
     return rgn->isEmpty() ? 1 : 0;
 }
 
@@ -99,8 +106,9 @@ Rect* GetRegionBounds(RgnHandle rgn, Rect* bounds)
 {
     if (!bounds)
         return nullptr;
-    if (!rgn) {
+    if (!rgn)
         shapeWarning("warning: GetRegionBounds: null region");
+    if (!VELMAR_CHECK_REGION(rgn)) {
         *bounds = Rect{0, 0, 0, 0};
         return bounds;
     }
