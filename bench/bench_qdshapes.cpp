@@ -87,6 +87,46 @@ void Qt_PaintRgn50(benchmark::State& state)
 }
 BENCHMARK(Qt_PaintRgn50)->Name("Qt/PaintRgn50");
 
+// Region algebra on two small regions: where checking the handles would show if it cost.
+const QRegion kSmallA = QRegion(10, 10, 40, 40) + QRegion(60, 10, 20, 20);
+const QRegion kSmallB = QRegion(30, 30, 40, 40);
+
+void QD_UnionRgn(benchmark::State& state)
+{
+    RgnHandle a = NewRgn(), b = NewRgn(), sum = NewRgn();
+    *a = kSmallA;
+    *b = kSmallB;
+    for (auto _ : state)
+        UnionRgn(a, b, sum);
+    DisposeRgn(a);
+    DisposeRgn(b);
+    DisposeRgn(sum);
+}
+BENCHMARK(QD_UnionRgn)->Name("QD/UnionRgn");
+
+void Qt_UnionRgn(benchmark::State& state)
+{
+    QRegion sum;
+    for (auto _ : state)
+        benchmark::DoNotOptimize(sum = kSmallA.united(kSmallB));
+}
+BENCHMARK(Qt_UnionRgn)->Name("Qt/UnionRgn");
+
+// Recording the largest oval the 16-bit plane holds (65535 rows).
+void RecordFullPlaneOval(benchmark::State& state)
+{
+    BenchWorld world;
+    const Rect full{-32768, -32768, 32767, 32767};
+    RgnHandle rgn = NewRgn();
+    for (auto _ : state) {
+        OpenRgn();
+        FrameOval(&full);
+        CloseRgn(rgn);
+    }
+    DisposeRgn(rgn);
+}
+BENCHMARK(RecordFullPlaneOval)->Name("Regions/RecordFullPlaneOval")->Unit(benchmark::kMillisecond);
+
 } // namespace
 
 VELMAR_BENCHMARK_MAIN()

@@ -25,7 +25,7 @@ void FrameOval(const Rect* r)
 {
     const QRect q = toQRect(r);
     if (!framingPort("FrameOval",
-                     [&q] { return QRegion(q, QRegion::Ellipse); })
+                     [&q] { return ellipseRegion(q); })
         || q.isEmpty())
         return;
     strokeShape("FrameOval", q, [&q](QPainter* p) { p->drawEllipse(q); });

@@ -10,6 +10,7 @@
 #include <QTransform>
 
 #include <algorithm>
+#include <cmath>
 #include <cstdlib>
 
 namespace Velmar {
@@ -47,10 +48,27 @@ void XorRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
     combine(a, b, dst, [](const QRegion& x, const QRegion& y) { return x.xored(y); });
 }
 
+namespace Private {
+
+bool staysNear(const QRectF& box)
+{
+    return !box.isValid()
+        || (!isFar(qint64(std::floor(box.left()))) && !isFar(qint64(std::ceil(box.right())))
+            && !isFar(qint64(std::floor(box.top()))) && !isFar(qint64(std::ceil(box.bottom()))));
+}
+
+} // namespace Private
+
+// Offsets pile up; a region is never carried out of the range Qt computes in.
 void OffsetRgn(RgnHandle rgn, short dh, short dv)
 {
-    if (VELMAR_CHECK_REGION(rgn))
-        rgn->translate(dh, dv);
+    if (!VELMAR_CHECK_REGION(rgn))
+        return;
+    if (!Private::staysNear(QRectF(rgn->boundingRect()).translated(dh, dv))) {
+        Private::shapeWarning("warning: OffsetRgn: offset out of range, region left as it was");
+        return;
+    }
+    rgn->translate(dh, dv);
 }
 
 void InsetRgn(RgnHandle rgn, short dh, short dv)
@@ -76,7 +94,18 @@ void MapRgn(RgnHandle rgn, const Rect* src, const Rect* dst)
     const double sx = double(Private::rectWidth(*dst)) / srcWidth;
     const double sy = double(Private::rectHeight(*dst)) / srcHeight;
     const QTransform map(sx, 0, 0, sy, dst->left - src->left * sx, dst->top - src->top * sy);
-    *rgn = map.map(*rgn);
+    // A steep scale can throw far parts of the region out of the range Qt computes in: only
+    // what lands inside it is mapped.
+    QRegion source = *rgn;
+    if (!Private::staysNear(map.mapRect(QRectF(source.boundingRect())))) {
+        const qint64 far = Private::kFarCoordinate;
+        const QRectF reach = map.inverted().mapRect(QRectF(-far, -far, 2.0 * far, 2.0 * far));
+        source &= QRect(QPoint(Private::clampFar(qint64(std::ceil(reach.left()))),
+                               Private::clampFar(qint64(std::ceil(reach.top())))),
+                        QPoint(Private::clampFar(qint64(std::floor(reach.right())) - 1),
+                               Private::clampFar(qint64(std::floor(reach.bottom())) - 1)));
+    }
+    *rgn = map.map(source);
 }
 
 } // namespace Velmar

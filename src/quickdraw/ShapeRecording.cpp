@@ -59,9 +59,4 @@ void forgetOpenPoly(PolyPtr* poly)
     }
 }
 
-QRegion polygonRegion(const QPolygon& polygon)
-{
-    return QRegion(polygon, Qt::OddEvenFill);
-}
-
 } // namespace Velmar::Private

@@ -5,6 +5,7 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "quickdraw/CurrentPort.h"
+#include "quickdraw/ShapeRegions.h"
 
 namespace Velmar::Private {
 
@@ -37,8 +38,5 @@ void discardRecording(QtGrafPort* port);
 // Called when a polygon is killed: a port still recording into it stops recording, so that
 // its polygon pointer never dangles.
 void forgetOpenPoly(PolyPtr* poly);
-
-// A polygon's area under the odd-even rule.
-QRegion polygonRegion(const QPolygon& polygon);
 
 } // namespace Velmar::Private
