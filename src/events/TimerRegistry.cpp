@@ -45,10 +45,13 @@ bool TimerRegistry::contains(const VelmarEventLoopTimer* timer) const
     return timer && m_timers.contains(timer);
 }
 
+// A new timer runs at once unless a blocker is active right now: timers stopped by a blocker
+// that has ended since wait for the next dispatch to restart, but a timer made after it
+// never belonged to it.
 void TimerRegistry::add(VelmarEventLoopTimer* timer)
 {
     m_timers.append(timer);
-    if (!m_enabled)
+    if (gMainEventQueue.CheckCarbonEventsDisabled())
         timer->stop();
 }
 

@@ -182,6 +182,25 @@ private Q_SLOTS:
         RemoveEventLoopTimer(timer);
     }
 
+    // A timer made after a blocker has ended was never the blocker's: it fires without
+    // waiting for a dispatch, ahead of the timers the blocker stopped.
+    void timersInstalledAfterABlockerRunAtOnce()
+    {
+        TimerTag old{"~old", {}}, fresh{"~fresh", {}};
+        EventLoopTimerRef stopped = install(0, 0, &old);
+        {
+            ScopedCarbonEventsBlocker blocker("assert");
+        }
+        QVERIFY(!MainTimerRegistry().isEnabled());
+        EventLoopTimerRef started = install(0, 0, &fresh);
+        QVERIFY(started->isRunning());
+        QVERIFY(!stopped->isRunning());
+        QTRY_VERIFY(!gSeen.isEmpty());
+        QCOMPARE(gSeen.first(), QStringLiteral("~fresh"));
+        RemoveEventLoopTimer(started);
+        RemoveEventLoopTimer(stopped);
+    }
+
     void timersInstalledWhileSuspendedWaitForResume()
     {
         TimerTag tag{"~late", {}};
