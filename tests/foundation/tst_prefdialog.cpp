@@ -145,6 +145,14 @@ private Q_SLOTS:
         QVERIFY(!dialog.checkBox(FeatureFlag::UseNativeEventAvail)->isChecked());
     }
 
+    void showUIOpDlgAsksTheListener()
+    {
+        VelmarTest::ScriptedAutomationListener listener({"Cancel"});
+        ShowUIOpDlg();
+        QCOMPARE(listener.count(), 1);
+        QCOMPARE(listener.questions().at(0).title, QStringLiteral("UI Operation Preferences"));
+    }
+
     void showUIOpDlgRunsModally()
     {
         bool sawDialog = false;

@@ -87,6 +87,24 @@ private Q_SLOTS:
         QCOMPARE(quint32(out), 0xFFFF0000u);
     }
 
+    // A scripted run answers instead of a user, so no box ever waits.
+    void getColorAsksTheListener()
+    {
+        const RGBColor in(0, 65535, 0);
+        RGBColor out(1, 2, 3);
+        VelmarTest::ScriptedAutomationListener listener({"OK", "#3366cc", "Cancel"});
+        const unsigned char prompt[] = "\x04Tint";
+        QCOMPARE(GetColor(Point{0, 0}, prompt, &in, &out), (unsigned char)1);
+        QCOMPARE(quint32(out), 0xFF00FF00u);
+        QCOMPARE(GetColor(Point{0, 0}, prompt, &in, &out), (unsigned char)1);
+        QCOMPARE(quint32(out), 0xFF3366CCu);
+        QCOMPARE(GetColor(Point{0, 0}, prompt, &in, &out), (unsigned char)0);
+        QCOMPARE(quint32(out), 0xFF3366CCu);
+        QCOMPARE(listener.count(), 3);
+        QCOMPARE(listener.questions().at(0).title, QStringLiteral("Tint"));
+        QCOMPARE(listener.questions().at(0).choices, QStringLiteral("OK|Cancel"));
+    }
+
     void getColorRejects()
     {
         RGBColor out(1, 2, 3);
