@@ -47,6 +47,9 @@ const std::pair<const char*, void (*)()> kNoPortCases[] = {
     {"warning: LineTo: cannot get current port", [] { LineTo(1, 1); }},
     {"warning: FrameRect: cannot get current port", [] { const Rect r = makeRect(0, 0, 9, 9); FrameRect(&r); }},
     {"warning: FrameOval: cannot get current port", [] { const Rect r = makeRect(0, 0, 9, 9); FrameOval(&r); }},
+    // Both point-list calls warn under the first one's name.
+    {"warning: DrawLinesFromPointPairs: cannot get Qt port", [] { DrawPolylineFromPoints({QPoint(1, 1)}); }},
+    {"OpColor: Can't get port", [] { const RGBColor c; OpColor(&c); }},
 };
 
 } // namespace
