@@ -4,10 +4,11 @@
 #include <Velmar/MacTypes.h>
 #include <Velmar/CarbonEvents.h>
 #include <Velmar/Events.h>
+#include <Velmar/WindowRef.h>
+
+#include <QEventLoop>
 
 namespace Velmar {
-
-class AQtWindow;
 
 namespace Private {
 struct EventHandler;
@@ -49,7 +50,7 @@ inline OSStatus InvokeEventHandlerUPP(EventHandlerCallRef callRef, EventRef even
 
 VELMAR_EXPORT EventTargetRef GetApplicationEventTarget();
 VELMAR_EXPORT EventTargetRef GetEventDispatcherTarget();
-VELMAR_EXPORT EventTargetRef GetWindowEventTarget(AQtWindow* inWindow);
+VELMAR_EXPORT EventTargetRef GetWindowEventTarget(WindowRef inWindow);
 
 // The newest handler is tried first. A null handler procedure, or a null list with a
 // non-zero count, is refused with paramErr.
@@ -99,6 +100,9 @@ VELMAR_EXPORT OSStatus InstallEventLoopTimer(EventLoopRef inEventLoop, EventTime
 VELMAR_EXPORT OSStatus RemoveEventLoopTimer(EventLoopTimerRef inTimer);
 // Makes the timer's procedure run at the next event processing, due or not.
 VELMAR_EXPORT OSStatus FireQtTimer(EventLoopTimerRef inTimer);
+
+// Lets Qt run one pass (no waiting) while Carbon handlers and event loop timers are held.
+VELMAR_EXPORT void ProcessNonCarbonEvents(QEventLoop::ProcessEventsFlags flags);
 
 VELMAR_EXPORT void QuitApplicationEventLoop();
 VELMAR_EXPORT bool InApplicationEventLoop();

@@ -13,7 +13,10 @@
 #include <Velmar/Events.h>
 #include <Velmar/CarbonEvents.h>
 #include <Velmar/CarbonEventHandlers.h>
+#include <Velmar/EventWaiting.h>
 #include <Velmar/QtGrafPort.h>
 #include <Velmar/QuickDraw.h>
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
+#include <Velmar/AQtWindow.h>
+#include <Velmar/Windows.h>

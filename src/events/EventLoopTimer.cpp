@@ -31,6 +31,12 @@ RepaintDirtyPortsHook SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook)
     return gRepaintDirtyPorts.set(hook);
 }
 
+void repaintDirtyPorts(int flags)
+{
+    if (RepaintDirtyPortsHook repaint = gRepaintDirtyPorts.get())
+        repaint(flags);
+}
+
 VelmarEventLoopTimer::VelmarEventLoopTimer(Callback callback, void* userData, int intervalMs)
     : m_callback(callback), m_userData(userData), m_interval(intervalMs),
       m_firstPhaseDone(true), m_firstDelay(intervalMs)
@@ -109,8 +115,7 @@ void VelmarEventLoopTimer::timerEvent(QTimerEvent* event)
     m_callback(this, m_userData);
     m_firing = false;
 
-    if (RepaintDirtyPortsHook repaint = gRepaintDirtyPorts.get())
-        repaint(0);
+    repaintDirtyPorts(0);
     MainTimerRegistry().resume();
 }
 

@@ -55,5 +55,7 @@ private:
 // then timers draw nothing by themselves. Returns the hook it replaces.
 using RepaintDirtyPortsHook = void (*)(int flags);
 RepaintDirtyPortsHook SetRepaintDirtyPortsHook(RepaintDirtyPortsHook hook);
+// Calls the installed hook (1: copy to the screen at once); nothing without windows.
+void repaintDirtyPorts(int flags);
 
 } // namespace Velmar::Private

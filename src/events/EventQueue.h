@@ -73,8 +73,10 @@ public:
     // The event loop timers. Defined with the timer machinery.
     TimerRegistry& timerRegistry();
 
-    // Lets Qt run one pass with Carbon dispatch blocked. Defined with the waiters.
+    // Lets Qt run one pass with Carbon dispatch blocked.
     void ProcessNonCarbonEvents(QEventLoop::ProcessEventsFlags flags);
+    // True while that pass runs (paint statistics count paints made inside it).
+    bool inNonCarbonProcessing() const { return m_inNonCarbonProcessing; }
 
     // Drops every queued item (tests, shutdown).
     void clearAll();
@@ -82,6 +84,7 @@ public:
 private:
     ItemList m_items;
     UInt64 m_changes = 0; // bumped by every change of m_items
+    bool m_inNonCarbonProcessing = false;
     bool m_hasQueueChangeEvent = false;
     bool m_carbonEventsDisabled = false;
     UInt16 m_eventMask = 7;

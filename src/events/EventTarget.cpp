@@ -12,7 +12,7 @@ EventTargetRef GetEventDispatcherTarget()
     return EventTargetRef{EventTargetRef::TargetTypeEventDispatcher, nullptr};
 }
 
-EventTargetRef GetWindowEventTarget(AQtWindow* inWindow)
+EventTargetRef GetWindowEventTarget(WindowRef inWindow)
 {
     return EventTargetRef{EventTargetRef::TargetTypeWindow, inWindow};
 }

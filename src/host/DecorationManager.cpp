@@ -2,6 +2,7 @@
 // install a factory so that the application creates theirs instead.
 #include <Velmar/HostShell.h>
 
+#include "host/FrameDecorator.h"
 #include "host/Replaceable.h"
 
 namespace Velmar::Brindle {
@@ -30,9 +31,22 @@ DecorationManager::~DecorationManager()
         gCurrent = m_previous;
 }
 
-void DecorationManager::Decorate(ManagedWindow*) {}
+// Decorated mode draws the shell's own frame; native mode leaves it to the window system.
+void DecorationManager::Decorate(ManagedWindow* window)
+{
+    if (!window || m_mdiMode != kMdiDecorated || window->GetDecorator() || !window->GetWidget())
+        return;
+    window->SetDecorator(new FrameDecorator(window));
+}
 
-void DecorationManager::Undecorate(ManagedWindow*) {}
+void DecorationManager::Undecorate(ManagedWindow* window)
+{
+    if (!window)
+        return;
+    Decorator* decorator = window->GetDecorator();
+    window->SetDecorator(nullptr);
+    delete decorator;
+}
 
 QWidget* DecorationManager::HiddenDefaultParent() const
 {

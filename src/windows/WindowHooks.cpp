@@ -1,0 +1,191 @@
+// What the layers below windows reach through their hooks: QuickDraw's ports (dirty areas,
+// direct drawing, scrolling, the screen), the event queue (deletion, pending update events,
+// titles) and the timers (repainting dirty ports). Installed once, by the first window.
+#include <Velmar/FeatureFlags.h>
+#include <Velmar/QtGrafPort.h>
+
+#include "events/EventLoopTimer.h"
+#include "events/EventQueueHooks.h"
+#include "events/EventQueueItem.h"
+#include "quickdraw/GrafPortPrivate.h"
+#include "host/Replaceable.h"
+#include "windows/WindowFilters.h"
+#include "windows/WindowPorts.h"
+#include "windows/WindowPrivate.h"
+
+namespace Velmar::Private {
+
+namespace {
+
+// ---- QuickDraw ----------------------------------------------------------------------------
+
+void markDirty(AQtWindow* window, const QRect& deviceRect)
+{
+    window->markGrafPortDirty(deviceRect);
+}
+
+bool isDirectDrawing(AQtWindow* window)
+{
+    return window->isDirectQtDrawing();
+}
+
+void scrollDirect(AQtWindow* window, const QRect& rect, int dh, int dv, QRegion* update)
+{
+    const QPoint origin = window->GetPort() ? window->GetPort()->origin() : QPoint();
+    const QRegion before = window->updateRegion();
+    window->scrollRect(dh, dv, rect.translated(-origin));
+    if (update)
+        *update = (window->updateRegion() - before.translated(dh, dv)).translated(origin);
+}
+
+QtGrafPort* frontVisiblePortExcept(AQtWindow* except)
+{
+    for (AQtWindow* window : windowList()) {
+        if (window != except && !window->IsDeletePending() && window->isVisible()
+            && window->GetPort())
+            return window->GetPort();
+    }
+    return nullptr;
+}
+
+bool visibleRegion(AQtWindow* window, QRegion* out)
+{
+    if (!LimitDrawingWithWindowVisibleRegion(kFeatureFlagQuery) || !window->isVisible()
+        || window->isDirectQtDrawing() || !window->GetPort())
+        return false;
+    *out = window->visibleRegion().translated(window->GetPort()->origin());
+    return true;
+}
+
+QPoint mapToGlobal(AQtWindow* window, const QPoint& local)
+{
+    return windowToGlobal(window, local);
+}
+
+QPoint mapFromGlobal(AQtWindow* window, const QPoint& global)
+{
+    return globalToWindow(window, global);
+}
+
+void flush(AQtWindow* window)
+{
+    window->flushDirtyPort(true);
+}
+
+QImage* backBuffer(AQtWindow*, const QSize& size)
+{
+    return makeBackBuffer(size);
+}
+
+// ---- The event queue --------------------------------------------------------------------------
+
+bool isDeletePending(AQtWindow* window)
+{
+    // A window that is gone is as good as deleted: its new events are dropped too.
+    return !isLive(window) || window->IsDeletePending();
+}
+
+bool isUpdateRegionEmpty(AQtWindow* window)
+{
+    return !isLive(window) || window->updateRegion().isEmpty();
+}
+
+UInt32 countPending()
+{
+    return pendingUpdateCount();
+}
+
+// A host comparator may dispose windows or flush while it looks: each pending event is held
+// for the look and handed back only while its window still holds it.
+EventQueueItem* findPending(PendingUpdatePredicate pred, void* data)
+{
+    const std::vector<QPointer<AQtWindow>> windows(windowList().begin(), windowList().end());
+    for (const QPointer<AQtWindow>& window : windows) {
+        if (!window)
+            continue;
+        const EventQueueItemSmartPtr pending = window->pendingUpdateEvent();
+        if (pending && pred(pending.get(), data) && window
+            && window->pendingUpdateEvent() == pending.get())
+            return pending.get();
+    }
+    return nullptr;
+}
+
+void clearPendingWhere(PendingUpdatePredicate pred, void* data)
+{
+    const std::vector<QPointer<AQtWindow>> windows(liveWindows().begin(), liveWindows().end());
+    for (const QPointer<AQtWindow>& window : windows) {
+        if (!window)
+            continue;
+        const EventQueueItemSmartPtr pending = window->pendingUpdateEvent();
+        if (pending && pred(pending.get(), data) && window
+            && window->pendingUpdateEvent() == pending.get())
+            window->clearPendingUpdateEvent();
+    }
+}
+
+void clearPending(AQtWindow* window)
+{
+    if (isLive(window))
+        window->clearPendingUpdateEvent();
+}
+
+QString windowTitle(AQtWindow* window)
+{
+    return isLive(window) ? window->windowTitle() : QString();
+}
+
+void repaintWindows(int flags)
+{
+    AQtWindow::RepaintDirtyPorts(flags != 0);
+}
+
+} // namespace
+
+namespace {
+Replaceable<WindowFilterHooks> gFilterHooks;
+}
+
+const WindowFilterHooks& windowFilterHooks()
+{
+    return gFilterHooks.get();
+}
+
+WindowFilterHooks SetWindowFilterHooks(const WindowFilterHooks& hooks)
+{
+    return gFilterHooks.set(hooks);
+}
+
+void ensureWindowHooks()
+{
+    static bool sInstalled = false;
+    if (sInstalled)
+        return;
+    sInstalled = true;
+
+    PortWindowHooks ports;
+    ports.markDirty = markDirty;
+    ports.isDirectDrawing = isDirectDrawing;
+    ports.scrollRect = scrollDirect;
+    ports.frontVisiblePortExcept = frontVisiblePortExcept;
+    ports.visibleRegion = visibleRegion;
+    ports.mapToGlobal = mapToGlobal;
+    ports.mapFromGlobal = mapFromGlobal;
+    ports.flush = flush;
+    ports.makeBackBuffer = backBuffer;
+    setPortWindowHooks(ports);
+
+    WindowEventHooks queue = windowEventHooks();
+    queue.isDeletePending = isDeletePending;
+    queue.isUpdateRegionEmpty = isUpdateRegionEmpty;
+    queue.countPendingUpdateEvents = countPending;
+    queue.findPendingUpdateEvent = findPending;
+    queue.clearPendingUpdateEvents = clearPendingWhere;
+    queue.clearPendingUpdateEvent = clearPending;
+    queue.windowTitle = windowTitle;
+    SetWindowEventHooks(queue);
+
+    SetRepaintDirtyPortsHook(repaintWindows);
+}
+
+} // namespace Velmar::Private
