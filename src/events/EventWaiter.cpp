@@ -187,14 +187,20 @@ bool VelmarEventWaiter::ProcessCarbonEvents(UInt32 count, const EventTypeSpec* l
     } else {
         for (;;) {
             if (m_d->mode == Classic) {
-                // A classic loop sees only what it asked for; the Carbon handlers see the rest.
+                // A classic loop sees only what it asked for; the Carbon handlers see the rest,
+                // once each: the items leave the queue before any handler (which may wait
+                // itself) runs.
+                std::vector<EventQueueItemSmartPtr> others;
                 queue.removeIf([&](EventQueueItem* item) {
                     if (matches(item) && item->isEventRecordCompatible())
                         return false;
-                    if (!item->IsSynchronized())
-                        dispatch(item);
+                    others.emplace_back(item);
                     return true;
                 });
+                for (const EventQueueItemSmartPtr& item : others) {
+                    if (!item->IsSynchronized())
+                        dispatch(item);
+                }
             }
             EventQueueItemSmartPtr item = queue.takeFirstMatching(list, count);
             if (!item && acceptsUpdates) {
