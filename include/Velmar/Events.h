@@ -3,6 +3,8 @@
 
 #include <Velmar/MacTypes.h>
 
+class QKeyEvent;
+
 namespace Velmar {
 
 class AQtWindow;
@@ -89,6 +91,32 @@ VELMAR_EXPORT UInt16 GetEventMask();
 
 // Ticks of 1/60 s from the host core's tick counter.
 VELMAR_EXPORT UInt32 TickCount();
+
+// ---- Polling the mouse and the keyboard --------------------------------------------------
+// Key and button state come from the window system as it is now, so that keys held while
+// no events are processed are seen too.
+
+// 128 bits, one per Mac key code: bit (code % 8) of byte (code / 8).
+using KeyMap = UInt32[4];
+
+// The system's left mouse button.
+VELMAR_EXPORT Boolean Button();
+// The button is still down and no mouse-down or mouse-up is waiting; drawing done while a
+// host tracks the mouse reaches the screen meanwhile.
+VELMAR_EXPORT Boolean StillDown();
+// StillDown; once the button is up, the mouse-up waiting in the queue is taken out.
+VELMAR_EXPORT Boolean WaitMouseUp();
+VELMAR_EXPORT void GetGlobalMouse(Point* where);
+VELMAR_EXPORT void GetKeys(KeyMap keys);
+// Whether the key with this Mac key code is down now (key code 0 is never reported).
+VELMAR_EXPORT Boolean IsKeyPressed(SInt32 macKeyCode);
+// The double-click interval in ticks.
+VELMAR_EXPORT UInt32 GetDblTime();
+VELMAR_EXPORT UInt32 LMGetDoubleTime();
+// The auto-key threshold in ticks: always 24.
+VELMAR_EXPORT SInt16 LMGetKeyThresh();
+// The first UTF-16 unit a key event typed; 0 for none.
+VELMAR_EXPORT UInt16 GetUTF16Char(QKeyEvent* event);
 // The Mac modifier bits of the keyboard state (cmdKey, shiftKey, alphaLock, optionKey).
 VELMAR_EXPORT UInt32 GetCurrentKeyModifiers();
 

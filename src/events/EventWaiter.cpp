@@ -6,6 +6,7 @@
 #include "events/EventLoopTimer.h"
 #include "events/EventQueue.h"
 #include "events/EventQueueHooks.h"
+#include "events/KeyCodeTables.h"
 #include "events/TimerRegistry.h"
 
 #include <Velmar/Application.h>
@@ -108,6 +109,7 @@ void prepareWaiting()
     if (sPrepared)
         return;
     sPrepared = true;
+    buildKeyboardTables();
     WaiterHooks hooks;
     hooks.isWaiterActive = waiterActive;
     hooks.beginFlushWaiter = beginFlushWaiter;

@@ -6,6 +6,7 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "events/EventQueue.h"
+#include "events/QtInputConversion.h"
 #include "windows/WindowFilters.h"
 #include "windows/WindowPorts.h"
 #include "windows/WindowPrivate.h"

@@ -7,6 +7,7 @@
 #include "events/EventLoopTimer.h"
 #include "events/EventQueueHooks.h"
 #include "events/EventQueueItem.h"
+#include "events/QtInputConversion.h"
 #include "quickdraw/GrafPortPrivate.h"
 #include "host/Replaceable.h"
 #include "windows/WindowFilters.h"
@@ -140,6 +141,18 @@ void repaintWindows(int flags)
     AQtWindow::RepaintDirtyPorts(flags != 0);
 }
 
+// ---- Input conversion ----------------------------------------------------------------------
+
+QWidget* windowWidget(AQtWindow* window)
+{
+    return isLive(window) ? window : nullptr;
+}
+
+bool minimizeMaximizeChange(AQtWindow* window)
+{
+    return isLive(window) && window->IsMinimizeMaximizeEvent();
+}
+
 } // namespace
 
 namespace {
@@ -186,6 +199,11 @@ void ensureWindowHooks()
     SetWindowEventHooks(queue);
 
     SetRepaintDirtyPortsHook(repaintWindows);
+
+    InputWindowHooks input;
+    input.widget = windowWidget;
+    input.isMinimizeMaximizeChange = minimizeMaximizeChange;
+    SetInputWindowHooks(input);
 }
 
 } // namespace Velmar::Private

@@ -8,6 +8,7 @@
 #include <Velmar/Windows.h>
 
 #include "events/EventQueue.h"
+#include "events/QtInputConversion.h"
 #include "foundation/Conversions.h"
 #include "platform/Platform.h"
 #include "quickdraw/RegionHandles.h"

@@ -79,10 +79,6 @@ void ensureWindowHooks();
 // The lower layers' view of a window's pending update events.
 UInt32 pendingUpdateCount();
 
-// The input converter of the events layer: fills `item` from a Qt event on `window`.
-class EventQueueItem;
-bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventQueueItem* item);
-
 // The library's focus request event: posted to a window's widget to give it focus later.
 QEvent::Type focusRequestEventType();
 
