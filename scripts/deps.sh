@@ -7,7 +7,7 @@ VELMAR_PACKAGES=(
   build-essential cmake ninja-build pkg-config ccache
   qt6-base-dev qt6-base-dev-tools libgl-dev libxcb1-dev libxkbcommon-dev
   libicu-dev libbenchmark-dev
-  xvfb xauth fonts-liberation2 libxtst6
+  xvfb xauth fonts-liberation2 libxtst6 openbox x11-utils
 )
 
 missing=()

@@ -1,6 +1,7 @@
 // The X11 backend against a real server: keys and buttons pressed through the XTEST
 // extension (libXtst is loaded at run time when present; no build dependency).
 #include "TestSupport.h"
+#include "XTestInput.h"
 
 #include <Velmar/Events.h>
 
@@ -9,50 +10,11 @@
 
 #include <QGuiApplication>
 
-#if defined(Q_OS_UNIX)
-#include <dlfcn.h>
-#endif
 
 using namespace Velmar::Private;
 namespace VK = Velmar::Private::VirtualKey;
 
-namespace {
-
-struct Display;
-
-// Just the Xlib and XTEST entry points the test needs, resolved at run time.
-struct XTest {
-    int (*fakeKey)(Display*, unsigned, int, unsigned long) = nullptr;
-    int (*fakeButton)(Display*, unsigned, int, unsigned long) = nullptr;
-    unsigned char (*keysymToKeycode)(Display*, unsigned long) = nullptr;
-    int (*sync)(Display*, int) = nullptr;
-    Display* display = nullptr;
-
-    bool load()
-    {
-#if QT_CONFIG(xcb) && defined(Q_OS_UNIX)
-        auto* x11 = qApp->nativeInterface<QNativeInterface::QX11Application>();
-        display = x11 ? reinterpret_cast<Display*>(x11->display()) : nullptr;
-        void* xtst = dlopen("libXtst.so.6", RTLD_NOW | RTLD_LOCAL);
-        void* xlib = dlopen("libX11.so.6", RTLD_NOW | RTLD_LOCAL);
-        if (!display || !xtst || !xlib)
-            return false;
-        fakeKey = reinterpret_cast<decltype(fakeKey)>(dlsym(xtst, "XTestFakeKeyEvent"));
-        fakeButton = reinterpret_cast<decltype(fakeButton)>(dlsym(xtst, "XTestFakeButtonEvent"));
-        keysymToKeycode = reinterpret_cast<decltype(keysymToKeycode)>(dlsym(xlib, "XKeysymToKeycode"));
-        sync = reinterpret_cast<decltype(sync)>(dlsym(xlib, "XSync"));
-        return fakeKey && fakeButton && keysymToKeycode && sync;
-#else
-        return false;
-#endif
-    }
-
-    void key(unsigned long keysym, bool press) { fakeKey(display, keysymToKeycode(display, keysym), press, 0); sync(display, 0); }
-    void button(unsigned button, bool press) { fakeButton(display, button, press, 0); sync(display, 0); }
-    void tap(unsigned long keysym) { key(keysym, true); key(keysym, false); }
-};
-
-} // namespace
+using XTest = VelmarTest::XTestInput;
 
 class X11InputTest : public QObject {
     Q_OBJECT
