@@ -35,12 +35,12 @@ public:
         return it == names.end() ? QStringLiteral("?") : it->second;
     }
 
-    // Runs the loop until `done` says so or five seconds pass.
-    void runUntil(const std::function<bool()>& done)
+    // Runs the loop until `done` says so or `limitMs` pass.
+    void runUntil(const std::function<bool()>& done, int limitMs = 5000)
     {
         QElapsedTimer clock;
         clock.start();
-        while (!done() && clock.elapsed() < 5000) {
+        while (!done() && clock.elapsed() < limitMs) {
             EventRecord e;
             if (!WaitNextEvent(everyEvent, &e, 3, nullptr)) {
                 ++nullEvents;
@@ -181,7 +181,7 @@ private Q_SLOTS:
         QVERIFY(b->pendingUpdateEvent());
         host.seen.clear();
         DisposeWindow(b);
-        host.runUntil([] { return false; });
+        host.runUntil([] { return false; }, 300);
         QVERIFY(!host.seen.entries().contains("update B"));
         QVERIFY(host.nullEvents > 0);
         DisposeWindow(a);
