@@ -7,10 +7,10 @@
 
 #include <Velmar/MacTypes.h>
 
+#include <QImage>
 #include <QString>
 
 class QEvent;
-class QImage;
 class QWidget;
 
 namespace Velmar::Private::Platform {
@@ -51,8 +51,12 @@ bool isNativeInputPending();
 void* nativeWindowHandle(QWidget* window);
 void placeNativeWindowBehind(QWidget* window, QWidget* behind);
 
-// An image for a window back buffer: DIB-backed on Windows, a plain QImage elsewhere.
-QImage createWindowImage(int width, int height);
+// An image for a window back buffer: DIB-backed on Windows, a plain QImage elsewhere. 32 bits
+// a pixel (premultiplied ARGB), or 5-6-5 for QImage::Format_RGB16.
+QImage createWindowImage(int width, int height,
+                         QImage::Format format = QImage::Format_ARGB32_Premultiplied);
+// The native drawing context behind such an image; null off Windows or for other images.
+void* windowImageDeviceContext(const QImage& image);
 
 // Optional diagnostic libraries.
 QString executableDirectory();

@@ -26,7 +26,7 @@ void placeNativeWindowBehind(QWidget* window, QWidget* behind)
         window->stackUnder(behind);
 }
 
-QImage createWindowImage(int width, int height)
+QImage createWindowImage(int width, int height, QImage::Format format)
 {
     // Toolbox coordinates are 16-bit: nothing larger can be a window's content.
     if (width <= 0 || height <= 0 || width > 32767 || height > 32767) {
@@ -34,7 +34,13 @@ QImage createWindowImage(int width, int height)
             qWarning("createWindowImage: refused size %d x %d", width, height);
         return QImage();
     }
-    return QImage(width, height, QImage::Format_ARGB32_Premultiplied);
+    return QImage(width, height,
+                  format == QImage::Format_RGB16 ? format : QImage::Format_ARGB32_Premultiplied);
+}
+
+void* windowImageDeviceContext(const QImage&)
+{
+    return nullptr;
 }
 
 } // namespace Velmar::Private::Platform
