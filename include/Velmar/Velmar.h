@@ -19,4 +19,5 @@
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
 #include <Velmar/AQtWindow.h>
+#include <Velmar/AQtWinGDImage.h>
 #include <Velmar/Windows.h>

@@ -155,7 +155,12 @@ private Q_SLOTS:
         m_x.moveTo(inA);
         m_x.button(1, true);
         m_x.button(1, false);
-        host.runUntil([&] { return host.seen.entries().contains("activate A"); });
+        // A window manager may hold the click back while it activates the window: wait for
+        // both before typing.
+        host.runUntil([&] {
+            return host.seen.entries().contains("activate A")
+                && host.seen.entries().contains("mouseDown 3 in A");
+        });
         m_x.tap(0x78); // "x"
         host.runUntil([&] { return host.seen.entries().contains("keyDown x"); });
         EventLoopTimerRef timer = nullptr;
