@@ -51,8 +51,11 @@ constexpr UInt8 kKeypadKeys[10] = {0x52, 0x53, 0x54, 0x55, 0x56, 0x57, 0x58, 0x5
 constexpr UInt8 kFunctionKeys[15] = {0x7A, 0x78, 0x63, 0x76, 0x60, 0x61, 0x62, 0x64,
                                      0x65, 0x6D, 0x67, 0x6F, 0x69, 0x6B, 0x71};
 
-// The Qt key each Windows virtual key stands for in Qt's Windows key mapper (0: a
-// character key the keyboard layout decides). Unlisted keys are Qt::Key_unknown.
+// The Qt key each Windows virtual key stands for in Qt's Windows key mapper. Unlisted keys
+// are Qt::Key_unknown or character keys the layout decides; neither names a Qt key here.
+// The keypad separator and decimal keys keep Qt 4's Key_Comma and Key_Period (later Qt
+// versions leave them to the layout): without them the keypad's decimal point would fall
+// through to virtual key 0x2E and arrive as a forward delete.
 struct QtKeyRow {
     int vk;
     int qtKey;
@@ -68,8 +71,8 @@ constexpr QtKeyRow kQtKeyRows[] = {
     {0x2A, Qt::Key_Printer}, {0x2B, Qt::Key_Execute}, {0x2C, Qt::Key_Print},
     {0x2D, Qt::Key_Insert}, {0x2E, Qt::Key_Delete}, {0x2F, Qt::Key_Help},
     {0x5B, Qt::Key_Meta}, {0x5C, Qt::Key_Meta}, {0x5D, Qt::Key_Menu}, {0x5F, Qt::Key_Sleep},
-    {0x6A, Qt::Key_Asterisk}, {0x6B, Qt::Key_Plus}, {0x6D, Qt::Key_Minus},
-    {0x6F, Qt::Key_Slash}, {0x90, Qt::Key_NumLock}, {0x91, Qt::Key_ScrollLock},
+    {0x6A, Qt::Key_Asterisk}, {0x6B, Qt::Key_Plus}, {0x6C, Qt::Key_Comma},
+    {0x6D, Qt::Key_Minus}, {0x6E, Qt::Key_Period}, {0x6F, Qt::Key_Slash}, {0x90, Qt::Key_NumLock}, {0x91, Qt::Key_ScrollLock},
     {0x93, Qt::Key_Massyo}, {0x94, Qt::Key_Touroku}, {0xA0, Qt::Key_Shift},
     {0xA1, Qt::Key_Shift}, {0xA2, Qt::Key_Control}, {0xA3, Qt::Key_Control},
     {0xA4, Qt::Key_Alt}, {0xA5, Qt::Key_Alt}, {0xA6, Qt::Key_Back}, {0xA7, Qt::Key_Forward},
@@ -83,8 +86,9 @@ constexpr QtKeyRow kQtKeyRows[] = {
 };
 
 // Non-ASCII Mac OS Roman characters and the US Mac keyboard key that types them with Option
-// or Shift-Option. The four spacing accents whose Option keys are dead keys (´ ˆ ˜ ¨ on E, I,
-// N, U) are left out: typing them takes two keys.
+// or Shift-Option. Left out: the accented letters the Option dead keys compose (two keys),
+// and the four spacing accents ´ ¨ ˆ ˜, which Shift-Option types on the dead keys themselves
+// (E, U, I, N) but which hosts meet as the dead-key sequence's result.
 struct CharacterRow {
     char16_t character;
     UInt8 macRoman;
@@ -92,8 +96,8 @@ struct CharacterRow {
 };
 constexpr CharacterRow kOptionCharacters[] = {
     {u'\u00E5', 0x8C, 0x00}, {u'\u00C5', 0x81, 0x00}, {u'\u222B', 0xBA, 0x0B}, {u'\u0131', 0xF5, 0x0B},
-    {u'\u00E7', 0x8D, 0x08}, {u'\u00C7', 0x82, 0x08}, {u'\u2202', 0xB6, 0x02}, {u'\u00CE', 0x94, 0x02},
-    {u'\u0192', 0xC4, 0x03}, {u'\u00CF', 0x95, 0x03}, {u'\u00A9', 0xA9, 0x05}, {u'\u02DD', 0xFD, 0x05},
+    {u'\u00E7', 0x8D, 0x08}, {u'\u00C7', 0x82, 0x08}, {u'\u2202', 0xB6, 0x02}, {u'\u00CE', 0xEB, 0x02},
+    {u'\u0192', 0xC4, 0x03}, {u'\u00CF', 0xEC, 0x03}, {u'\u00A9', 0xA9, 0x05}, {u'\u02DD', 0xFD, 0x05},
     {u'\u02D9', 0xFA, 0x04}, {u'\u00D3', 0xEE, 0x04}, {u'\u2206', 0xC6, 0x26}, {u'\u00D4', 0xEF, 0x26},
     {u'\u02DA', 0xFB, 0x28}, {u'\uF8FF', 0xF0, 0x28}, {u'\u00AC', 0xC2, 0x25}, {u'\u00D2', 0xF1, 0x25},
     {u'\u00B5', 0xB5, 0x2E}, {u'\u00C2', 0xE5, 0x2E}, {u'\u00F8', 0xBF, 0x1F}, {u'\u00D8', 0xAF, 0x1F},
