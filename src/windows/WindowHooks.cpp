@@ -96,33 +96,40 @@ UInt32 countPending()
     return pendingUpdateCount();
 }
 
-// A host comparator may dispose windows or flush while it looks: each pending event is held
-// for the look and handed back only while its window still holds it.
-EventQueueItem* findPending(PendingUpdatePredicate pred, void* data)
+// The pending update event of each window in `list` that the host's predicate accepts,
+// handed to `act` until it returns true. A host comparator may dispose windows or flush while
+// it looks: each pending event is held for the look and counts only while its window still
+// holds it.
+template <typename Windows, typename Act>
+void forAcceptedPending(const Windows& list, PendingUpdatePredicate pred, void* data, Act act)
 {
-    const std::vector<QPointer<AQtWindow>> windows(windowList().begin(), windowList().end());
+    const std::vector<QPointer<AQtWindow>> windows(list.begin(), list.end());
     for (const QPointer<AQtWindow>& window : windows) {
         if (!window)
             continue;
         const EventQueueItemSmartPtr pending = window->pendingUpdateEvent();
         if (pending && pred(pending.get(), data) && window
-            && window->pendingUpdateEvent() == pending.get())
-            return pending.get();
+            && window->pendingUpdateEvent() == pending.get() && act(window.data(), pending.get()))
+            return;
     }
-    return nullptr;
+}
+
+EventQueueItem* findPending(PendingUpdatePredicate pred, void* data)
+{
+    EventQueueItem* found = nullptr;
+    forAcceptedPending(windowList(), pred, data, [&found](AQtWindow*, EventQueueItem* pending) {
+        found = pending;
+        return true;
+    });
+    return found;
 }
 
 void clearPendingWhere(PendingUpdatePredicate pred, void* data)
 {
-    const std::vector<QPointer<AQtWindow>> windows(liveWindows().begin(), liveWindows().end());
-    for (const QPointer<AQtWindow>& window : windows) {
-        if (!window)
-            continue;
-        const EventQueueItemSmartPtr pending = window->pendingUpdateEvent();
-        if (pending && pred(pending.get(), data) && window
-            && window->pendingUpdateEvent() == pending.get())
-            window->clearPendingUpdateEvent();
-    }
+    forAcceptedPending(liveWindows(), pred, data, [](AQtWindow* window, EventQueueItem*) {
+        window->clearPendingUpdateEvent();
+        return false;
+    });
 }
 
 void clearPending(AQtWindow* window)

@@ -147,51 +147,56 @@ void AQtWindow::endUpdate()
 
 // ---- The free calls --------------------------------------------------------------------------
 
-OSStatus InvalWindowRect(WindowRef window, const Rect* bounds)
+namespace {
+
+// The four calls share their checks: a hidden window ignores them; the rectangle or region
+// is in port coordinates.
+template <typename Shape>
+OSStatus changeUpdateRegion(WindowRef window, const Shape* shape, bool add)
 {
     if (!VELMAR_CHECK_WINDOW(window))
         return errInvalidWindowPtr;
     if (window->isHidden())
         return noErr;
-    if (bounds)
-        window->addUpdateRegion(toQRect(bounds).translated(-portOrigin(window)));
+    QRegion region;
+    if constexpr (std::is_same_v<Shape, Rect>) {
+        // InvalWindowRect alone takes a null rectangle as nothing to add.
+        if (!shape)
+            return add ? noErr : errNullWindowArgument;
+        region = QRegion(toQRect(shape));
+    } else {
+        if (!shape || !VELMAR_CHECK_REGION(shape))
+            return errNullWindowArgument;
+        region = *shape;
+    }
+    region.translate(-portOrigin(window));
+    if (add)
+        window->addUpdateRegion(region);
+    else
+        window->removeUpdateRegion(region);
     return noErr;
+}
+
+} // namespace
+
+OSStatus InvalWindowRect(WindowRef window, const Rect* bounds)
+{
+    return changeUpdateRegion(window, bounds, true);
 }
 
 OSStatus InvalWindowRgn(WindowRef window, RgnHandle region)
 {
-    if (!VELMAR_CHECK_WINDOW(window))
-        return errInvalidWindowPtr;
-    if (window->isHidden())
-        return noErr;
-    if (!region || !VELMAR_CHECK_REGION(region))
-        return errNullWindowArgument;
-    window->addUpdateRegion(region->translated(-portOrigin(window)));
-    return noErr;
+    return changeUpdateRegion(window, region, true);
 }
 
 OSStatus ValidWindowRect(WindowRef window, const Rect* bounds)
 {
-    if (!VELMAR_CHECK_WINDOW(window))
-        return errInvalidWindowPtr;
-    if (window->isHidden())
-        return noErr;
-    if (!bounds)
-        return errNullWindowArgument;
-    window->removeUpdateRegion(QRegion(toQRect(bounds).translated(-portOrigin(window))));
-    return noErr;
+    return changeUpdateRegion(window, bounds, false);
 }
 
 OSStatus ValidWindowRgn(WindowRef window, RgnHandle region)
 {
-    if (!VELMAR_CHECK_WINDOW(window))
-        return errInvalidWindowPtr;
-    if (window->isHidden())
-        return noErr;
-    if (!region || !VELMAR_CHECK_REGION(region))
-        return errNullWindowArgument;
-    window->removeUpdateRegion(region->translated(-portOrigin(window)));
-    return noErr;
+    return changeUpdateRegion(window, region, false);
 }
 
 void BeginUpdate(WindowRef window)

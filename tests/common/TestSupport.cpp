@@ -192,4 +192,12 @@ void isolateSettings()
     QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, dir.path());
 }
 
+QStringList IgnoredAssertions::texts() const
+{
+    QStringList out;
+    for (const Question& q : questions())
+        out << assertionText(q.text);
+    return out;
+}
+
 } // namespace VelmarTest

@@ -68,6 +68,14 @@ private:
     Velmar::AutomationListener* m_previous = nullptr;
 };
 
+// Answers every assertion "Ignore" while it lives and keeps the texts raised (as
+// assertionText gives them): for calls that are meant to refuse bad input and go on.
+class IgnoredAssertions : public ScriptedAutomationListener {
+public:
+    IgnoredAssertions() : ScriptedAutomationListener({}, QStringLiteral("Ignore")) {}
+    QStringList texts() const;
+};
+
 // For tests that show a real modal box: while it lives, no automation listener answers (so
 // the library shows its real dialogs), and it polls for the active modal widget and hands
 // the first one to `act` (which clicks or closes it). If `act` leaves it open, or nothing

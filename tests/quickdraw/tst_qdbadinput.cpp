@@ -15,18 +15,7 @@ using Velmar::Private::makeRect;
 
 namespace {
 
-// Answers every assertion "Ignore" and records its text.
-class Asserts : public VelmarTest::ScriptedAutomationListener {
-public:
-    Asserts() : ScriptedAutomationListener({}, QStringLiteral("Ignore")) {}
-    QStringList texts() const
-    {
-        QStringList out;
-        for (const Question& q : questions())
-            out << VelmarTest::assertionText(q.text);
-        return out;
-    }
-};
+using Asserts = VelmarTest::IgnoredAssertions;
 
 // A port that was live once: its memory is freed by the time the calls get it.
 GrafPtr disposedPort()

@@ -7,20 +7,7 @@
 using namespace Velmar;
 using namespace WindowTest;
 
-namespace {
-
-struct Asserts : VelmarTest::ScriptedAutomationListener {
-    Asserts() : ScriptedAutomationListener({}, QStringLiteral("Ignore")) {}
-    QStringList texts() const
-    {
-        QStringList out;
-        for (const Question& q : questions())
-            out << VelmarTest::assertionText(q.text);
-        return out;
-    }
-};
-
-} // namespace
+using Asserts = VelmarTest::IgnoredAssertions;
 
 class tst_WindowCreate : public QObject {
     Q_OBJECT
