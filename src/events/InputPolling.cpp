@@ -1,9 +1,9 @@
 // The classic polling calls: the mouse button, the mouse position, the keyboard, timing.
-#include "events/EventMask.h"
 #include "events/EventLoopTimer.h"
 #include "events/EventQueue.h"
 #include "events/KeyCodeTables.h"
 
+#include <Velmar/EventWaiting.h>
 #include <Velmar/Events.h>
 #include <Velmar/FeatureFlags.h>
 #include <Velmar/HostShell.h>
@@ -29,13 +29,6 @@ constexpr UInt16 kMouseDownOrUp = mDownMask | mUpMask;
 
 // A mouse-down or mouse-up is waiting. (The waiting layer's EventAvail answers the same for
 // queued events; update events never count here.)
-bool mouseClickWaiting()
-{
-    EventTypeList types;
-    ParseEventMask(kMouseDownOrUp, types);
-    return gMainEventQueue.findFirstMatching(types.specs, types.count) != nullptr;
-}
-
 void setKeyBit(UInt8* bytes, int keyCode, bool down)
 {
     if (keyCode < 0 || keyCode >= 128)
@@ -63,7 +56,9 @@ Boolean StillDown()
         return false;
     // What the host drew while tracking must be seen while it tracks.
     repaintDirtyPorts(1);
-    return !mouseClickWaiting();
+    // EventAvail also sees a click that has reached the application but not the queue yet.
+    EventRecord click;
+    return !EventAvail(kMouseDownOrUp, &click);
 }
 
 Boolean WaitMouseUp()

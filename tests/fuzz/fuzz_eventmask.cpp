@@ -35,11 +35,11 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
         FUZZ_CHECK((mask == everyEvent) == (n == 0 && mask != 0));
         // Every pair the parser gives belongs to a bit of the mask.
         for (UInt32 i = 0; n > 0 && i < list.count; ++i) {
-            EventTypeSpec spec{};
+            EventTypeSpec type{};
             bool found = false;
             for (UInt16 code = 1; code <= 6; ++code) {
-                if (Private::ClassicEventType(code, spec) && spec.eventClass == list.specs[i].eventClass
-                    && spec.eventKind == list.specs[i].eventKind)
+                if (Private::ClassicEventType(code, type) && type.eventClass == list.specs[i].eventClass
+                    && type.eventKind == list.specs[i].eventKind)
                     found = found || (mask & (1u << code));
             }
             const bool activateOrOs = list.specs[i].eventClass == kEventClassWindow

@@ -216,10 +216,10 @@ struct Soak {
     void handlerStep()
     {
         if (handlers.empty() || (handlers.size() < 6 && pick(2) == 0)) {
-            const EventTypeSpec spec{kSoakClass, 7};
+            const EventTypeSpec type{kSoakClass, 7};
             EventHandlerRef ref = nullptr;
             const int id = nextHandlerId++;
-            QCOMPARE(InstallEventHandler(GetApplicationEventTarget(), handler, 1, &spec,
+            QCOMPARE(InstallEventHandler(GetApplicationEventTarget(), handler, 1, &type,
                                          reinterpret_cast<void*>(quintptr(id)), &ref), noErr);
             handlers.emplace_back(ref, id);
         } else if (pick(3) == 0) {
