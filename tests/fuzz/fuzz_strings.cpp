@@ -43,8 +43,11 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     QString2PascalString(text, back);
     FUZZ_CHECK(back[0] <= 255);
     if (QString(CurrentMacEncodingName()) == QLatin1String("macintosh")) {
-        // A single-byte encoding with no holes maps every byte one to one.
-        FUZZ_CHECK(back[0] == a[0] && std::memcmp(back + 1, a + 1, a[0]) == 0);
+        // A single-byte encoding with no holes maps every byte one to one, up to the first
+        // NUL, which ends the text.
+        const auto* nul = static_cast<const unsigned char*>(std::memchr(a + 1, 0, a[0]));
+        const size_t kept = nul ? size_t(nul - (a + 1)) : a[0];
+        FUZZ_CHECK(back[0] == kept && std::memcmp(back + 1, a + 1, kept) == 0);
     }
 
     // The string calls agree with each other.
