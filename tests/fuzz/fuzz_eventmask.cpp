@@ -13,10 +13,11 @@ using VelmarFuzz::Bytes;
 
 namespace {
 
-// Which classic codes a mask names, straight from the bit meanings.
+// Which classic codes a mask names, straight from the bit meanings. A mask of 0, like
+// everyEvent, parses to no pairs, and no pairs match every event.
 bool maskTakes(UInt16 mask, UInt16 code)
 {
-    return mask == everyEvent || (code >= 1 && code <= 15 && (mask & (1u << code)));
+    return mask == everyEvent || mask == 0 || (code >= 1 && code <= 15 && (mask & (1u << code)));
 }
 
 } // namespace
