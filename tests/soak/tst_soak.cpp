@@ -1,5 +1,5 @@
-// A seeded soak: random sequences of valid calls across drawing, regions, the queue, handlers
-// and timers for a bounded time, each step checked against a small model of what must hold,
+// A seeded soak: random sequences of valid calls across drawing, regions, the queue, handlers,
+// timers and windows for a bounded time, each step checked against a small model of what must hold,
 // and resident memory checked to stop growing once the caches are warm.
 //     VELMAR_SOAK_SEED=n      replays one run (the seed is printed either way)
 //     VELMAR_SOAK_SECONDS=s   how long to run (10 by default)
@@ -14,6 +14,7 @@
 #include <Velmar/QDShapes.h>
 #include <Velmar/QtGrafPort.h>
 #include <Velmar/QuickDraw.h>
+#include <Velmar/Windows.h>
 
 #include <QElapsedTimer>
 #include <QFile>
@@ -70,6 +71,7 @@ struct Soak {
     int lateFirings = 0;                                // removed timers that still fired
     int queuedKeys = 0;                                 // our keyDowns in the queue
     int queuedCarbon = 0;                               // our Carbon events in the queue
+    std::vector<WindowRef> windows;
     UInt32 steps = 0;
 
     explicit Soak(quint32 seed) : rng(seed) {}
@@ -259,6 +261,52 @@ struct Soak {
         QCOMPARE(lateFirings, 0);
     }
 
+    // Windows come and go, move, grow and redraw; the window list holds exactly the live ones.
+    void windowStep()
+    {
+        if (windows.size() < 4 && (windows.empty() || pick(3) == 0)) {
+            static const SInt16 kProcIds[] = {0, 1, 2, 3, 4, 5, 8, 16};
+            const Rect bounds{SInt16(60 + pick(200)), SInt16(pick(300)), SInt16(60 + pick(500)), SInt16(pick(600))};
+            const unsigned char title[] = "\x04soak";
+            windows.push_back(NewCWindow(nullptr, &bounds, title, Boolean(pick(4) != 0), kProcIds[pick(8)],
+                                         reinterpret_cast<AQtWindow*>(-1), true, nullptr));
+            QVERIFY(windows.back());
+        } else if (pick(4) == 0) {
+            const size_t i = size_t(pick(int(windows.size())));
+            DisposeWindow(windows[i]);
+            windows.erase(windows.begin() + long(i));
+        } else {
+            WindowRef w = windows[size_t(pick(int(windows.size())))];
+            switch (pick(5)) {
+            case 0: SelectWindow(w); break;
+            case 1: SizeWindow(w, SInt16(pick(1200) - 100), SInt16(pick(1200) - 100), true); break;
+            case 2: MoveWindow(w, coord(2000), coord(2000), Boolean(pick(2))); break;
+            case 3: {
+                const Rect r = rect();
+                InvalWindowRect(w, &r);
+                EventRecord update;
+                if (GetNextEvent(updateMask, &update)) {
+                    BeginUpdate(update.window);
+                    EndUpdate(update.window);
+                }
+                queuedKeys = queuedCarbon = 0; // a classic wait hands the rest to the handlers
+                break;
+            }
+            default: {
+                SetPortWindowPort(w);
+                const Rect r = rect();
+                PaintRect(&r);
+                SetPort(world);
+                break;
+            }
+            }
+        }
+        std::set<WindowRef> listed;
+        for (WindowRef w = GetWindowList(); w && listed.size() <= windows.size(); w = GetNextWindow(w))
+            QVERIFY2(listed.insert(w).second, "a window listed twice");
+        QCOMPARE(listed, std::set<WindowRef>(windows.begin(), windows.end()));
+    }
+
     void step()
     {
         ++steps;
@@ -267,16 +315,26 @@ struct Soak {
         case 1: regionStep(); break;
         case 2: queueStep(); break;
         default:
-            if (pick(2))
-                handlerStep();
-            else
-                timerStep();
+            switch (pick(3)) {
+            case 0: handlerStep(); break;
+            case 1: timerStep(); break;
+            default: windowStep(); break;
+            }
             break;
         }
     }
 
+    void disposeWindows()
+    {
+        for (WindowRef w : windows)
+            DisposeWindow(w);
+        windows.clear();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+
     void tearDown()
     {
+        disposeWindows();
         for (const auto& [handle, model] : regions)
             DisposeRgn(handle);
         regions.clear();
@@ -323,11 +381,14 @@ private Q_SLOTS:
                 qWarning("failed at step %u of seed %u", soak.steps, seed);
                 break;
             }
-            if (warm < 0 && clock.elapsed() > total / 3)
+            // Measured with no window open: their back buffers come and go in megabytes.
+            if (warm < 0 && clock.elapsed() > total / 3) {
+                soak.disposeWindows();
                 warm = residentKiB();
+            }
         }
-        const long end = residentKiB();
         soak.tearDown();
+        const long end = residentKiB();
         SetPort(nullptr);
         DisposeGWorld(soak.world);
         gSoak = nullptr;
