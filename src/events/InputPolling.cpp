@@ -48,7 +48,8 @@ Boolean Button()
 
 Boolean StillDown()
 {
-    if (EnableLooperFiltering(kFeatureFlagQuery) && !QGuiApplication::mouseButtons().testFlag(Qt::LeftButton)) {
+    if (EnableLooperFiltering(kFeatureFlagQuery)
+        && !QGuiApplication::mouseButtons().testFlag(Qt::LeftButton)) {
         repaintDirtyPorts(1);
         return false;
     }

@@ -68,12 +68,12 @@ private:
 };
 
 // A broken invariant ends the run loudly, with what was found.
-#define FUZZ_CHECK(cond)                                                                    \
-    do {                                                                                    \
-        if (!(cond)) {                                                                      \
-            fprintf(stderr, "fuzz invariant broken: %s (%s:%d)\n", #cond, __FILE__, __LINE__); \
-            abort();                                                                        \
-        }                                                                                   \
+#define FUZZ_CHECK(cond)                                                                           \
+    do {                                                                                           \
+        if (!(cond)) {                                                                             \
+            fprintf(stderr, "fuzz invariant broken: %s (%s:%d)\n", #cond, __FILE__, __LINE__);     \
+            abort();                                                                               \
+        }                                                                                          \
     } while (0)
 
 } // namespace VelmarFuzz

@@ -40,7 +40,8 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
             EventTypeSpec type{};
             bool found = false;
             for (UInt16 code = 1; code <= 6; ++code) {
-                if (Private::ClassicEventType(code, type) && type.eventClass == list.specs[i].eventClass
+                if (Private::ClassicEventType(code, type)
+                    && type.eventClass == list.specs[i].eventClass
                     && type.eventKind == list.specs[i].eventKind)
                     found = found || (mask & (1u << code));
             }
@@ -64,8 +65,8 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
             EventRecord e{};
             e.what = 0xFFFF;
             const bool avail = EventAvail(mask, &e);
-            FUZZ_CHECK(!avail || e.what == nullEvent || maskTakes(mask, e.what) || mask == everyEvent
-                       || e.what > 15);
+            FUZZ_CHECK(!avail || e.what == nullEvent || maskTakes(mask, e.what)
+                || mask == everyEvent || e.what > 15);
             break;
         }
         case 2: {
@@ -75,8 +76,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
                 FUZZ_CHECK(e.what != nullEvent || postedNull);
             break;
         }
-        default:
-            break;
+        default: break;
         }
     }
     Private::gMainEventQueue.clearAll();

@@ -15,10 +15,18 @@ using VelmarFuzz::Bytes;
 namespace {
 
 constexpr EventParamName kNames[] = {
-    kEventParamMouseButton, kEventParamWindowRef, kEventParamWindowPartCode,
-    kEventParamMouseLocation, kEventParamKeyModifiers, kEventParamKeyCode,
-    kEventParamKeyMacCharCodes, kEventParamMouseWheelAxis, kEventParamMouseWheelDelta,
-    kEventParamCurrentBounds, kEventParamDirectObject, FOUR_CHAR_CODE("junk"),
+    kEventParamMouseButton,
+    kEventParamWindowRef,
+    kEventParamWindowPartCode,
+    kEventParamMouseLocation,
+    kEventParamKeyModifiers,
+    kEventParamKeyCode,
+    kEventParamKeyMacCharCodes,
+    kEventParamMouseWheelAxis,
+    kEventParamMouseWheelDelta,
+    kEventParamCurrentBounds,
+    kEventParamDirectObject,
+    FOUR_CHAR_CODE("junk"),
 };
 
 } // namespace
@@ -48,10 +56,10 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
             EventParamType actualType = 0;
             ByteCount actualSize = 0;
             std::memset(buffer, 0xCC, sizeof(buffer));
-            const OSStatus result = GetEventParameter(event, name, type, &actualType, bufferSize,
-                                                      &actualSize, buffer);
+            const OSStatus result =
+                GetEventParameter(event, name, type, &actualType, bufferSize, &actualSize, buffer);
             FUZZ_CHECK(result == noErr || result == eventParameterNotFoundErr
-                       || result == errAECoercionFail);
+                || result == errAECoercionFail);
             if (result == noErr)
                 FUZZ_CHECK(actualSize <= bufferSize);
             // Nothing beyond the buffer the caller named is touched.

@@ -79,9 +79,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
             XorRgn(a, b, d);
             FUZZ_CHECK(*d == qa.united(qb).subtracted(qa.intersected(qb)));
             break;
-        case 5:
-            OffsetRgn(a, in.s16(), in.s16());
-            break;
+        case 5: OffsetRgn(a, in.s16(), in.s16()); break;
         case 6: {
             const SInt16 dh = SInt16(int8_t(in.u8())), dv = SInt16(int8_t(in.u8()));
             InsetRgn(a, dh, dv);
@@ -145,9 +143,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
             KillPoly(poly); // twice: refused
             break;
         }
-        default:
-            SetClip(a);
-            break;
+        default: SetClip(a); break;
         }
     }
     for (RgnHandle r : slots)

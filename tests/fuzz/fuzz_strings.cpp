@@ -12,7 +12,8 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
     VelmarFuzz::ensureApplication();
     Bytes in(data, size);
-    static const char* const kEncodings[] = {"macintosh", "Shift_JIS", "x-mac-cyrillic", "x-mac-greek"};
+    static const char* const kEncodings[] = {
+        "macintosh", "Shift_JIS", "x-mac-cyrillic", "x-mac-greek"};
     SetCurrentMacEncoding(kEncodings[in.u8() % 4]);
 
     unsigned char a[256] = {}, b[256] = {};
@@ -21,11 +22,13 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 
     // Bytes to UTF-16: measuring and converting agree, and nothing is written past the buffer.
     unsigned short units[300];
-    const SInt32 needed = CurrentMacMBCSEncodingToUTF16(reinterpret_cast<const char*>(a + 1), a[0], nullptr, 0);
+    const SInt32 needed =
+        CurrentMacMBCSEncodingToUTF16(reinterpret_cast<const char*>(a + 1), a[0], nullptr, 0);
     FUZZ_CHECK(needed >= 0 && needed <= 255 * 2);
     const int room = in.u8() % 300;
     units[room < 300 ? room : 299] = 0xBEEF;
-    const SInt32 got = CurrentMacMBCSEncodingToUTF16(reinterpret_cast<const char*>(a + 1), a[0], units, room);
+    const SInt32 got =
+        CurrentMacMBCSEncodingToUTF16(reinterpret_cast<const char*>(a + 1), a[0], units, room);
     FUZZ_CHECK(got == needed);
 
     // And back, into buffers of every small size: always terminated, never overrun.
@@ -33,7 +36,8 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     const SInt32 dst = SInt32(in.u8()) + 1;
     bytes[dst] = 0x5A;
     bool lossy = false;
-    const SInt32 written = UTF16ToCurrentMacMBCSEncoding(units, qMin(got, SInt32(room)), bytes, dst, &lossy);
+    const SInt32 written =
+        UTF16ToCurrentMacMBCSEncoding(units, qMin(got, SInt32(room)), bytes, dst, &lossy);
     FUZZ_CHECK(written >= 0 && written < dst && bytes[written] == 0 && bytes[dst] == 0x5A);
 
     // Pascal strings through QString and back stay within 255 bytes.

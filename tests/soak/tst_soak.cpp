@@ -65,12 +65,12 @@ struct Soak {
     std::vector<std::pair<RgnHandle, QRegion>> regions; // each handle with its model
     std::vector<std::pair<EventHandlerRef, int>> handlers; // with their ids, oldest first
     int nextHandlerId = 0;
-    QStringList calls;                                  // handlers run by the last send
+    QStringList calls; // handlers run by the last send
     std::set<EventLoopTimerRef> timers;
     std::set<EventLoopTimerRef> removedTimers;
-    int lateFirings = 0;                                // removed timers that still fired
-    int queuedKeys = 0;                                 // our keyDowns in the queue
-    int queuedCarbon = 0;                               // our Carbon events in the queue
+    int lateFirings = 0; // removed timers that still fired
+    int queuedKeys = 0; // our keyDowns in the queue
+    int queuedCarbon = 0; // our Carbon events in the queue
     std::vector<WindowRef> windows;
     UInt32 steps = 0;
 
@@ -103,7 +103,10 @@ struct Soak {
         case 0: FrameRect(&r); break;
         case 1: PaintOval(&r); break;
         case 2: InvertRect(&r); break;
-        case 3: MoveTo(r.left, r.top); LineTo(r.right, r.bottom); break;
+        case 3:
+            MoveTo(r.left, r.top);
+            LineTo(r.right, r.bottom);
+            break;
         case 4: PenSize(SInt16(pick(6)), SInt16(pick(6))); break;
         default: {
             // The one pixel oracle: a painted rectangle inside the port holds the pen colour.
@@ -137,14 +140,27 @@ struct Soak {
         case 0: {
             const Rect r = rect();
             RectRgn(a, &r);
-            qa = r.bottom > r.top && r.right > r.left ? QRegion(r.left, r.top, r.right - r.left, r.bottom - r.top)
-                                                      : QRegion();
+            qa = r.bottom > r.top && r.right > r.left
+                ? QRegion(r.left, r.top, r.right - r.left, r.bottom - r.top)
+                : QRegion();
             break;
         }
-        case 1: { const QRegion q = qa.united(qb); UnionRgn(a, b, d); qd = q; break; }
-        case 2: { const QRegion q = qa.intersected(qb); SectRgn(a, b, d); qd = q; break; }
-        case 3: { const QRegion q = qa.subtracted(qb); DiffRgn(a, b, d); qd = q; break; }
-        case 4: { const QRegion q = qa.xored(qb); XorRgn(a, b, d); qd = q; break; }
+        case 1:
+        case 2:
+        case 3:
+        case 4: {
+            // Each call against QRegion's own operation; the destination may be a source.
+            using Call = void (*)(RgnHandle, RgnHandle, RgnHandle);
+            using Model = QRegion (QRegion::*)(const QRegion&) const;
+            static const std::pair<Call, Model> kAlgebra[] = {{UnionRgn, &QRegion::united},
+                {SectRgn, &QRegion::intersected}, {DiffRgn, &QRegion::subtracted},
+                {XorRgn, &QRegion::xored}};
+            const auto& [call, model] = kAlgebra[pick(4)];
+            const QRegion q = (qa.*model)(qb);
+            call(a, b, d);
+            qd = q;
+            break;
+        }
         case 5: {
             const SInt16 dh = SInt16(pick(40) - 20), dv = SInt16(pick(40) - 20);
             OffsetRgn(a, dh, dv);
@@ -159,7 +175,8 @@ struct Soak {
         }
         }
         for (const auto& [handle, model] : regions)
-            QVERIFY2(*handle == model, qPrintable(QStringLiteral("region differs from its model at step %1").arg(steps)));
+            QVERIFY2(*handle == model,
+                qPrintable(QStringLiteral("region differs from its model at step %1").arg(steps)));
     }
 
     void queueStep()
@@ -204,13 +221,14 @@ struct Soak {
         struct Counter {
             int n = 0;
         } counter;
-        FindSpecificEventInQueue(GetMainEventQueue(),
-                                 [](EventRef e, void* data) {
-                                     if (GetEventClass(e) == kSoakClass)
-                                         ++static_cast<Counter*>(data)->n;
-                                     return false;
-                                 },
-                                 &counter);
+        FindSpecificEventInQueue(
+            GetMainEventQueue(),
+            [](EventRef e, void* data) {
+                if (GetEventClass(e) == kSoakClass)
+                    ++static_cast<Counter*>(data)->n;
+                return false;
+            },
+            &counter);
         QCOMPARE(counter.n, queuedCarbon);
         QVERIFY(GetNumEventsInQueue(GetMainEventQueue()) >= UInt32(queuedKeys + queuedCarbon));
     }
@@ -222,7 +240,8 @@ struct Soak {
             EventHandlerRef ref = nullptr;
             const int id = nextHandlerId++;
             QCOMPARE(InstallEventHandler(GetApplicationEventTarget(), handler, 1, &type,
-                                         reinterpret_cast<void*>(quintptr(id)), &ref), noErr);
+                         reinterpret_cast<void*>(quintptr(id)), &ref),
+                noErr);
             handlers.emplace_back(ref, id);
         } else if (pick(3) == 0) {
             const size_t i = size_t(pick(int(handlers.size())));
@@ -246,8 +265,9 @@ struct Soak {
     {
         if (timers.size() < 4 && pick(2) == 0) {
             EventLoopTimerRef timer = nullptr;
-            QCOMPARE(InstallEventLoopTimer(GetMainEventLoop(), pick(3) * 0.001, pick(2) * 0.002, timerFired, nullptr, &timer),
-                     noErr);
+            QCOMPARE(InstallEventLoopTimer(GetMainEventLoop(), pick(3) * 0.001, pick(2) * 0.002,
+                         timerFired, nullptr, &timer),
+                noErr);
             timers.insert(timer);
             removedTimers.erase(timer); // an address may be reused
         } else if (!timers.empty()) {
@@ -266,10 +286,11 @@ struct Soak {
     {
         if (windows.size() < 4 && (windows.empty() || pick(3) == 0)) {
             static const SInt16 kProcIds[] = {0, 1, 2, 3, 4, 5, 8, 16};
-            const Rect bounds{SInt16(60 + pick(200)), SInt16(pick(300)), SInt16(60 + pick(500)), SInt16(pick(600))};
+            const Rect bounds{SInt16(60 + pick(200)), SInt16(pick(300)), SInt16(60 + pick(500)),
+                SInt16(pick(600))};
             const unsigned char title[] = "\x04soak";
-            windows.push_back(NewCWindow(nullptr, &bounds, title, Boolean(pick(4) != 0), kProcIds[pick(8)],
-                                         reinterpret_cast<AQtWindow*>(-1), true, nullptr));
+            windows.push_back(NewCWindow(nullptr, &bounds, title, Boolean(pick(4) != 0),
+                kProcIds[pick(8)], reinterpret_cast<AQtWindow*>(-1), true, nullptr));
             QVERIFY(windows.back());
         } else if (pick(4) == 0) {
             const size_t i = size_t(pick(int(windows.size())));
@@ -302,7 +323,8 @@ struct Soak {
             }
         }
         std::set<WindowRef> listed;
-        for (WindowRef w = GetWindowList(); w && listed.size() <= windows.size(); w = GetNextWindow(w))
+        for (WindowRef w = GetWindowList(); w && listed.size() <= windows.size();
+             w = GetNextWindow(w))
             QVERIFY2(listed.insert(w).second, "a window listed twice");
         QCOMPARE(listed, std::set<WindowRef>(windows.begin(), windows.end()));
     }
@@ -392,10 +414,12 @@ private Q_SLOTS:
         SetPort(nullptr);
         DisposeGWorld(soak.world);
         gSoak = nullptr;
-        qInfo("%u steps; resident %ld KiB after warm-up, %ld KiB at the end", soak.steps, warm, end);
+        qInfo(
+            "%u steps; resident %ld KiB after warm-up, %ld KiB at the end", soak.steps, warm, end);
         // Every handle is reused, so after warm-up memory may wobble but must not climb.
         if (kMemoryMeasurable && warm > 0 && end > 0)
-            QVERIFY2(end - warm < 8 * 1024, qPrintable(QStringLiteral("grew %1 KiB after warm-up").arg(end - warm)));
+            QVERIFY2(end - warm < 8 * 1024,
+                qPrintable(QStringLiteral("grew %1 KiB after warm-up").arg(end - warm)));
     }
 };
 
