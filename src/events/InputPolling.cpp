@@ -27,8 +27,6 @@ namespace VK = VirtualKey;
 
 constexpr UInt16 kMouseDownOrUp = mDownMask | mUpMask;
 
-// A mouse-down or mouse-up is waiting. (The waiting layer's EventAvail answers the same for
-// queued events; update events never count here.)
 void setKeyBit(UInt8* bytes, int keyCode, bool down)
 {
     if (keyCode < 0 || keyCode >= 128)
