@@ -3,6 +3,11 @@
 
 #include <Velmar/MacTypes.h>
 
+class QEvent;
+class QKeyEvent;
+class QMouseEvent;
+class QWidget;
+
 namespace Velmar {
 
 class AQtWindow;
@@ -156,6 +161,14 @@ VELMAR_EXPORT OSStatus SetEventParameter(EventRef event, EventParamName name, Ev
                                          ByteCount size, const void* data);
 
 VELMAR_EXPORT bool ConvertEventRefToEventRecord(EventRef event, EventRecord* outRecord);
+
+// A Qt event as an event object, as windows (`window`) and the application (null) convert
+// what they receive: Mac key and char codes, Mac modifiers, global points, wheel steps,
+// window and application events. False when the Qt event makes no Toolbox event. Mouse
+// positions are taken relative to `widget`.
+VELMAR_EXPORT bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventRef item);
+VELMAR_EXPORT bool ConvertMouseEvent(QMouseEvent* e, EventRef item, const QWidget* widget);
+VELMAR_EXPORT bool ConvertKeyEvent(QKeyEvent* e, EventRef item);
 
 // ---------------------------------------------------------------------------------------
 // The event queue. There is one; every accessor returns it.

@@ -22,7 +22,9 @@
 
 #include <cstdlib>
 
-namespace Velmar::Private {
+namespace Velmar {
+
+using namespace Private;
 
 namespace {
 
@@ -83,18 +85,20 @@ bool isPureModifier(int key)
 
 } // namespace
 
-const InputWindowHooks& inputWindowHooks()
+const InputWindowHooks& Private::inputWindowHooks()
 {
     return gInputHooks.get();
 }
 
-InputWindowHooks SetInputWindowHooks(const InputWindowHooks& hooks)
+InputWindowHooks Private::SetInputWindowHooks(const InputWindowHooks& hooks)
 {
     return gInputHooks.set(hooks);
 }
 
-bool ConvertMouseEvent(QMouseEvent* e, EventQueueItem* item, const QWidget* widget)
+bool ConvertMouseEvent(QMouseEvent* e, EventRef item, const QWidget* widget)
 {
+    if (!e || !item || !VELMAR_CHECK_EVENT(item))
+        return false;
     item->eventClass = kEventClassMouse;
     item->attributes = kEventAttributeUserEvent;
     const bool leftHeld = e->buttons() & Qt::LeftButton;
@@ -128,7 +132,7 @@ bool ConvertMouseEvent(QMouseEvent* e, EventQueueItem* item, const QWidget* widg
     return true;
 }
 
-bool ConvertWheelEvent(QWheelEvent* e, EventQueueItem* item)
+bool Private::ConvertWheelEvent(QWheelEvent* e, EventQueueItem* item)
 {
     const QPoint angle = e->angleDelta();
     const bool horizontal = std::abs(angle.x()) > std::abs(angle.y());
@@ -149,8 +153,10 @@ bool ConvertWheelEvent(QWheelEvent* e, EventQueueItem* item)
     return true;
 }
 
-bool ConvertKeyEvent(QKeyEvent* e, EventQueueItem* item)
+bool ConvertKeyEvent(QKeyEvent* e, EventRef item)
 {
+    if (!e || !item || !VELMAR_CHECK_EVENT(item))
+        return false;
     item->eventClass = kEventClassKeyboard;
     item->attributes = kEventAttributeUserEvent;
     switch (e->type()) {
@@ -190,9 +196,9 @@ bool ConvertKeyEvent(QKeyEvent* e, EventQueueItem* item)
     return true;
 }
 
-bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventQueueItem* item)
+bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventRef item)
 {
-    if (!item)
+    if (!item || !VELMAR_CHECK_EVENT(item))
         return false;
     item->clear();
     item->when = TickCount();
@@ -252,4 +258,4 @@ bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventQueueItem* item)
     }
 }
 
-} // namespace Velmar::Private
+} // namespace Velmar

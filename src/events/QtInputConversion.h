@@ -4,6 +4,8 @@
 
 #include "events/EventQueueItem.h"
 
+#include <Velmar/CarbonEvents.h>
+
 class QEvent;
 class QKeyEvent;
 class QMouseEvent;
@@ -12,10 +14,10 @@ class QWidget;
 
 namespace Velmar::Private {
 
-// False when the event makes no Toolbox event (nothing to post).
-bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventQueueItem* item);
-bool ConvertMouseEvent(QMouseEvent* e, EventQueueItem* item, const QWidget* widget);
-bool ConvertKeyEvent(QKeyEvent* e, EventQueueItem* item);
+// The public converters (CarbonEvents.h), under the names the library's own code uses.
+using Velmar::ConvertKeyEvent;
+using Velmar::ConvertMouseEvent;
+using Velmar::ConvertVelmarEvent;
 bool ConvertWheelEvent(QWheelEvent* e, EventQueueItem* item);
 
 // What conversion needs from the window layer. Unset: no widget, no state change.

@@ -9,6 +9,8 @@
 #include <Velmar/Events.h>
 #include <Velmar/MacErrors.h>
 
+#include <QKeyEvent>
+
 #include <functional>
 
 using namespace Velmar;
@@ -144,8 +146,13 @@ private Q_SLOTS:
         QCOMPARE(SendEventToEventTarget(event, GetApplicationEventTarget()), OSStatus(eventInternalErr));
         RetainEvent(event);
         QCOMPARE(CallNextEventHandler(gKeptCallRef, event), OSStatus(paramErr));
+        QKeyEvent key(QEvent::KeyPress, Qt::Key_A, Qt::NoModifier, QStringLiteral("a"));
+        QVERIFY(!ConvertVelmarEvent(nullptr, &key, event));
+        QVERIFY(!ConvertKeyEvent(&key, event));
+        QVERIFY(!ConvertKeyEvent(nullptr, nullptr)); // null: refused quietly
+        QVERIFY(!ConvertMouseEvent(nullptr, nullptr, nullptr));
         RemoveEventHandler(handler);
-        QCOMPARE(listener->count(), 7);
+        QCOMPARE(listener->count(), 9);
         QStringList texts;
         for (const auto& q : listener->questions())
             texts << VelmarTest::assertionText(q.text);
