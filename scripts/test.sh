@@ -10,4 +10,6 @@ jobs="${VELMAR_TEST_JOBS:-$(nproc)}"
 if [ -n "${DISPLAY:-}" ]; then
   exec ctest --output-on-failure -j "$jobs" "$@"
 fi
-exec xvfb-run -a -s "-screen 0 1280x800x24" ctest --output-on-failure -j "$jobs" "$@"
+# A server of the suite's own: it picks a free display itself, so runs side by side (or an
+# xvfb-run elsewhere) cannot take each other's.
+exec "$root/tests/run-on-own-display.sh" ctest --output-on-failure -j "$jobs" "$@"

@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Runs one test on an X server of its own, and with --wm under a window manager (openbox),
+# Runs one test (or the whole suite) on an X server of its own, and with --wm under a window manager (openbox),
 # so that real input and the window manager's activation and stacking neither disturb nor
 # are disturbed by the tests running beside it.
 set -uo pipefail
