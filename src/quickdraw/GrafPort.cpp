@@ -260,16 +260,22 @@ void QtGrafPort::setPen(const QPen& pen)
 
 void QtGrafPort::setForeColor(const QColor& color)
 {
-    d->inkChanged();
-    if (d->painterActive) {
-        if (painter->pen().color() == color)
-            return;
-        QPen pen = painter->pen();
-        pen.setColor(color);
-        painter->setPen(pen);
-    } else {
+    if (!d->painterActive) {
+        d->inkChanged();
         painterState.pen.setColor(color);
+        return;
     }
+    const QPen& current = painter->pen();
+    if (current.color() == color)
+        return;
+    d->inkChanged();
+    const bool back = d->penBeforeColour.color() == color && d->penAfterColour == current;
+    QPen next = back ? std::move(d->penBeforeColour) : current;
+    if (!back)
+        next.setColor(color);
+    d->penBeforeColour = current;
+    painter->setPen(next);
+    d->penAfterColour = std::move(next);
 }
 
 void QtGrafPort::setBrush(const QBrush& brush)

@@ -42,6 +42,12 @@ struct QtGrafPortPrivate {
     // The pen as it was when HidePen hid it.
     QPen savedPen;
 
+    // The painter's pen before the last colour change and the pen it became (the same but
+    // for the colour): a host that alternates two colours gets the earlier pen back instead
+    // of a newly allocated one.
+    QPen penBeforeColour;
+    QPen penAfterColour;
+
     static QtGrafPortPrivate* get(QtGrafPort* port) { return port->d; }
     static const QtGrafPortPrivate* get(const QtGrafPort* port) { return port->d; }
 };
