@@ -93,6 +93,26 @@ private Q_SLOTS:
         QCOMPARE(world->painter->compositionMode(), QPainter::CompositionMode_SourceOver);
     }
 
+    // Colours that alternate reuse earlier pens: everything else the pen held must survive,
+    // whatever changed between two colour changes.
+    void alternatingColoursKeepThePen()
+    {
+        World world(8);
+        QVERIFY(world.painter());
+        const RGBColor red(65535, 0, 0), blue(0, 0, 65535);
+        for (const RGBColor* c : {&red, &blue, &red})
+            RGBForeColor(c);
+        PenSize(3, 3);
+        RGBForeColor(&blue);
+        QCOMPARE(world->painter->pen().width(), 3);
+        SetPenStyle(Qt::DashLine);
+        RGBForeColor(&red);
+        RGBForeColor(&blue);
+        QCOMPARE(world->painter->pen().style(), Qt::DashLine);
+        QCOMPARE(world->painter->pen().width(), 3);
+        QCOMPARE(world->painter->pen().color(), QColor(0, 0, 255));
+    }
+
     void penStateRoundTrip()
     {
         World world(8);
