@@ -18,6 +18,7 @@
 #include <Velmar/QuickDraw.h>
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
+#include <Velmar/QDText.h>
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>
 #include <Velmar/Windows.h>

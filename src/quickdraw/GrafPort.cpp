@@ -48,6 +48,8 @@ PainterState::PainterState()
       brush(Qt::black),
       background(Qt::white)
 {
+    // Whole-pixel advances, as the Toolbox and Windows measure text.
+    font.setHintingPreference(QFont::PreferFullHinting);
 }
 
 void PainterState::saveFrom(const QPainter& painter)

@@ -13,6 +13,22 @@
 
 namespace Velmar::Private {
 
+struct FontEntry;
+
+// Text state a port keeps beyond its public fields: the font ID and face as the host last
+// set them (-1 until then: read back from the font), how text meets what is under it, and
+// the interned metrics of the font last drawn or measured with.
+struct PortTextState {
+    SInt16 fontId = -1;
+    SInt16 face = -1;
+    QPainter::CompositionMode composition = QPainter::CompositionMode_SourceOver;
+    // Set only by an explicit TextMode(srcCopy): fresh ports draw text without a background.
+    bool opaque = false;
+    FontEntry* entry = nullptr;
+    UInt32 entryGeneration = 0;
+    QFont entryFont; // the font `entry` was found for
+};
+
 // A port's private record: its pixels, whether its painter runs, and the caches that spare
 // repeated drawing any work. None of it is port state a host can see.
 struct QtGrafPortPrivate {
@@ -47,6 +63,8 @@ struct QtGrafPortPrivate {
     // of a newly allocated one.
     QPen penBeforeColour;
     QPen penAfterColour;
+
+    PortTextState text;
 
     static QtGrafPortPrivate* get(QtGrafPort* port) { return port->d; }
     static const QtGrafPortPrivate* get(const QtGrafPort* port) { return port->d; }

@@ -38,6 +38,9 @@ constexpr NoPortWarning kWarnings[] = {
     {"SetPenState", kCantGetSpaced},
     {"GetBackColor", kCantGetSpaced},
     {"Velmar::TextMode", kCantGetSpaced},
+    {"TextFont", kCantGetSpaced},
+    {"TextSize", kCantGetSpaced},
+    {"TextFace", kCantGetSpaced},
     // Frames, lines, recording and clip.
     {"FrameRect", kCannotGet},
     {"FrameOval", kCannotGet},
@@ -63,6 +66,10 @@ constexpr NoPortWarning kWarnings[] = {
     {"DrawLinesFromPointPairs", kCannotGetQt},
     {"GetPortPenLocation", kCannotGetQt},
     {"GetPortPenMode", kCannotGetQt},
+    {"GetPortTextFont", kCannotGetQt},
+    {"GetPortTextSize", kCannotGetQt},
+    {"GetPortTextFace", kCannotGetQt},
+    {"GetPortTextMode", kCannotGetQt},
     {"SetCPixel", kCannotGetQt},
     {"GetCPixel", kCannotGetQt},
     // Wordings of their own.

@@ -6,6 +6,8 @@
 
 #include "quickdraw/ShapeRegions.h"
 
+#include <Velmar/QDText.h>
+
 #include <climits>
 #include <functional>
 
@@ -55,6 +57,10 @@ private Q_SLOTS:
             {"SetPortOpColor", [&] { SetPortOpColor(stale, &color); }},
             {"GetPortPenLocation", [&] { QCOMPARE(GetPortPenLocation(stale, &point), nullptr); }},
             {"GetPortPenMode", [&] { QCOMPARE(GetPortPenMode(stale), SInt16(0)); }},
+            {"GetPortTextFont", [&] { QCOMPARE(GetPortTextFont(stale), SInt16(0)); }},
+            {"GetPortTextSize", [&] { QCOMPARE(GetPortTextSize(stale), SInt16(0)); }},
+            {"GetPortTextFace", [&] { QCOMPARE(GetPortTextFace(stale), Style(0)); }},
+            {"GetPortTextMode", [&] { QCOMPARE(GetPortTextMode(stale), SInt16(0)); }},
             {"GetPortPixMap", [&] { QCOMPARE(GetPortPixMap(stale), nullptr); }},
             {"GetPortBitMapForCopyBits", [&] { QVERIFY(!GetPortBitMapForCopyBits(stale).image()); }},
             {"SetPortClipRegion", [&] { SetPortClipRegion(stale, rgn.get()); }},
