@@ -64,6 +64,18 @@ enum : EventClass {
     kEventClassKeyboard = FOUR_CHAR_CODE("keyb"),
     kEventClassWindow = FOUR_CHAR_CODE("wind"),
     kEventClassApplication = FOUR_CHAR_CODE("appl"),
+    // The library's own class: events with no event-record form, for Carbon handlers only.
+    kEventClassVelmar = FOUR_CHAR_CODE("vlmr"),
+};
+
+// Kinds of the library's class.
+enum : EventKind {
+    kEventVelmarMenuTriggered = FOUR_CHAR_CODE("mntg"), // a menu item fired: call MenuSelect
+    kEventVelmarUpdateMenus = FOUR_CHAR_CODE("upmn"),   // a menu is about to show
+    kEventVelmarResized = FOUR_CHAR_CODE("size"),
+    kEventVelmarZoomed = FOUR_CHAR_CODE("zoom"),
+    kEventVelmarMoved = FOUR_CHAR_CODE("move"),
+    kEventVelmarCloseRequested = FOUR_CHAR_CODE("clos"),
 };
 
 // Kinds of the mouse class.

@@ -67,6 +67,8 @@ enum : EventModifiers {
     alphaLock = 0x0400,
     optionKey = 0x0800,
     controlKey = 0x1000,
+    rightShiftKey = 0x2000,
+    rightOptionKey = 0x4000,
 };
 
 // osEvt messages: the message code sits in the high byte.

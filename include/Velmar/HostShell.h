@@ -134,6 +134,12 @@ public:
     virtual void Undecorate(ManagedWindow* window);
     // Parent for new windows while they are not yet decorated; the default has none.
     virtual QWidget* HiddenDefaultParent() const;
+    // Puts the application's menu bar where the user sees it: into `window` when one is
+    // given (a QMainWindow's menu bar, or the top of its layout), otherwise as a strip
+    // across the top of the primary screen, as the classic menu bar was. A shell that
+    // places the bar itself overrides this. Called when the bar gets its first menu and
+    // whenever the host moves it (SetMenuBarWindow).
+    virtual void PlaceMenuBar(QMenuBar* menuBar, QWidget* window);
 
     static DecorationManager* Instance(); // the current one, null when none exists
     static QWidget* GetHiddenDefaultParent(); // of the current instance; null without one

@@ -22,3 +22,4 @@
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>
 #include <Velmar/Windows.h>
+#include <Velmar/Menus.h>

@@ -11,20 +11,17 @@
 
 namespace Velmar::Private {
 
-// The library's own event classes and kinds.
+// The library's own event classes and kinds (the public ones are in CarbonEvents.h).
 enum : UInt32 {
-    kEventClassVelmar = FOUR_CHAR_CODE("vlmr"),        // library events, never records
     kEventClassVelmarClassic = FOUR_CHAR_CODE("vlme"), // PostEvent: kind = the classic code
 };
-
-enum : UInt32 {
-    kEventVelmarMenuTriggered = FOUR_CHAR_CODE("mntg"),
-    kEventVelmarUpdateMenus = FOUR_CHAR_CODE("upmn"),
-    kEventVelmarResized = FOUR_CHAR_CODE("size"),
-    kEventVelmarZoomed = FOUR_CHAR_CODE("zoom"),
-    kEventVelmarMoved = FOUR_CHAR_CODE("move"),
-    kEventVelmarCloseRequested = FOUR_CHAR_CODE("clos"),
-};
+using ::Velmar::kEventClassVelmar;
+using ::Velmar::kEventVelmarCloseRequested;
+using ::Velmar::kEventVelmarMenuTriggered;
+using ::Velmar::kEventVelmarMoved;
+using ::Velmar::kEventVelmarResized;
+using ::Velmar::kEventVelmarUpdateMenus;
+using ::Velmar::kEventVelmarZoomed;
 
 // A plain record: fields are public because the converters fill them directly.
 // Copying (operator=) copies every field, the reference count included.

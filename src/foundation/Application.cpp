@@ -215,7 +215,7 @@ void AQtApplication::menuAboutToShow(QMenu* menu)
             hooks.applyMenuFont(menu);
     }
     if (QMenu* popup = Private::runningPopupMenu(this)) {
-        const bool menuBarMenu = menu && d->menuBar->actions().contains(menu->menuAction());
+        const bool menuBarMenu = menu && d->menuBar && d->menuBar->actions().contains(menu->menuAction());
         if (menu && !(menuBarMenu && menu != popup))
             return; // a submenu of the pop-up, or the pop-up itself, is opening
         popup->close();

@@ -5,9 +5,8 @@
 
 #include <QAbstractNativeEventFilter>
 #include <QList>
+#include <QMenuBar>
 #include <QPointer>
-
-class QMenuBar;
 
 namespace Velmar {
 
@@ -25,7 +24,8 @@ struct PostponedTimer {
 
 struct AQtApplicationPrivate {
     bool decorationFlag = false;
-    QMenuBar* menuBar = nullptr;                           // owned
+    // Owned; guarded because a host window the bar was placed in could still take it along.
+    QPointer<QMenuBar> menuBar;
     Brindle::DecorationManager* decorationManager = nullptr; // owned until ShutdownApp
     QList<PostponedTimer> postponedTimers; // arrival order, one entry per timer id
     bool applicationActive = false;

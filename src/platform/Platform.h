@@ -50,6 +50,9 @@ bool isNativeInputPending();
 // window manager, Windows makes the historical SetWindowPos call.
 void* nativeWindowHandle(QWidget* window);
 void placeNativeWindowBehind(QWidget* window, QWidget* behind);
+// Asks the window manager to keep the top `height` pixels of the screen for `window` (the
+// menu-bar strip), so that other windows are placed below it. Nothing where it cannot.
+void reserveScreenTop(QWidget* window, int height);
 
 // An image for a window back buffer: DIB-backed on Windows, a plain QImage elsewhere. 32 bits
 // a pixel (premultiplied ARGB), or 5-6-5 for QImage::Format_RGB16.

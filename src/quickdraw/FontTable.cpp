@@ -146,4 +146,9 @@ int fontRowCount()
     return int(rows().size());
 }
 
+const FontRow& fontRowAt(int index)
+{
+    return rows().at(size_t(index));
+}
+
 } // namespace Velmar::Private

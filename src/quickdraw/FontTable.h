@@ -27,7 +27,8 @@ SInt16 fontIdByToolboxName(const QString& name);
 // The first ID whose Qt family is `family` (ignoring case); -1 when none.
 SInt16 fontIdByFamily(const QString& family);
 
-// The number of rows (fixed and added).
+// The number of rows (fixed and added), and row `index` of them in table order.
 int fontRowCount();
+const FontRow& fontRowAt(int index);
 
 } // namespace Velmar::Private

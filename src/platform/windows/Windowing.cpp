@@ -66,6 +66,10 @@ void placeNativeWindowBehind(QWidget* window, QWidget* behind)
     SetWindowPos(target, insertAfter, 0, 0, 0, 0, SWP_NOSIZE | SWP_NOMOVE | SWP_NOACTIVATE);
 }
 
+// The strip is a topmost window; Windows keeps work-area reservations for application
+// desktop toolbars, which the menu bar is not.
+void reserveScreenTop(QWidget*, int) {}
+
 QImage createWindowImage(int width, int height, QImage::Format format)
 {
     const bool rgb16 = format == QImage::Format_RGB16;

@@ -6,6 +6,7 @@
 
 #include "platform/KeyTables.h"
 #include "platform/VirtualKeys.h"
+#include "platform/x11/XcbConnection.h"
 
 #include <QGuiApplication>
 
@@ -26,20 +27,6 @@ namespace VK = VirtualKey;
 // then costs one round trip.
 constexpr SInt64 kKeymapLifetimeMs = 5000;
 constexpr UInt32 kNumLockKeysym = 0xff7f;
-
-xcb_connection_t* qtConnection()
-{
-#if QT_CONFIG(xcb)
-    auto* app = qobject_cast<QGuiApplication*>(QCoreApplication::instance());
-    if (!app)
-        return nullptr;
-    auto* x11 = app->nativeInterface<QNativeInterface::QX11Application>();
-    xcb_connection_t* connection = x11 ? x11->connection() : nullptr;
-    return (connection && !xcb_connection_has_error(connection)) ? connection : nullptr;
-#else
-    return nullptr;
-#endif
-}
 
 SInt64 nowMs()
 {
@@ -72,7 +59,7 @@ int keyFromColumns(const xcb_keysym_t* syms, int count)
 
 XcbKeyboard* XcbKeyboard::get()
 {
-    xcb_connection_t* connection = qtConnection();
+    xcb_connection_t* connection = xcbConnection();
     if (!connection)
         return nullptr;
     static XcbKeyboard keyboard;
