@@ -22,4 +22,6 @@
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>
 #include <Velmar/Windows.h>
+#include <Velmar/Resources.h>
+#include <Velmar/QDIcons.h>
 #include <Velmar/Menus.h>
