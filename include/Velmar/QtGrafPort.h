@@ -58,18 +58,23 @@ protected:
     friend class QtGrafPort;
 };
 
-// The pixmap object around a port's image (which the port owns).
+// The pixmap object around a port's image (which the port owns), or around an image of its
+// own (a host's pixmap: NewPixMap, TxCopyHand), which it owns.
 class VELMAR_EXPORT PixMapPtr : public BitMapPtr {
 public:
     static PixMapPtr* createPixMap(QImage* image, QtGrafPort* port, SInt16 pixelDepth);
+    // Takes `image` over; it is freed with the pixmap.
+    static PixMapPtr* createOwnedPixMap(QImage* image, SInt16 pixelDepth);
     static void destroyPixMap(PixMapPtr* pixmap);
 
     SInt16 pixelDepth() const { return m_pixelDepth; }
+    bool ownsImage() const { return m_ownsImage; }
 
 private:
-    PixMapPtr(QImage* image, QtGrafPort* port, SInt16 depth)
-        : BitMapPtr(image, port), m_pixelDepth(depth) {}
+    PixMapPtr(QImage* image, QtGrafPort* port, SInt16 depth, bool owns)
+        : BitMapPtr(image, port), m_pixelDepth(depth), m_ownsImage(owns) {}
     SInt16 m_pixelDepth;
+    bool m_ownsImage;
 };
 
 namespace Private {

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <Velmar/MacTypes.h>
+#include <Velmar/QDTypes.h>
 
 namespace Velmar {
 
@@ -95,5 +96,13 @@ VELMAR_EXPORT void CloseResFile(SInt16 refNum);
 VELMAR_EXPORT void SetResLoad(Boolean load);
 // There is one resource file, 0; another refNum is logged in the QuickDraw category.
 VELMAR_EXPORT void UseResFile(SInt16 refNum);
+
+// ---- Pixmap handles -----------------------------------------------------------------------
+// Memory never moves: locking always succeeds and unlocking does nothing.
+VELMAR_EXPORT Boolean TxHLock(PixMapPtr* pixmap);
+VELMAR_EXPORT void TxHUnLock(PixMapPtr* pixmap, Boolean wasLocked);
+// A new pixmap owning a copy of the pixels (dispose of it with DisposePixMap); null for a
+// null or disposed pixmap.
+VELMAR_EXPORT PixMapPtr* TxCopyHand(PixMapPtr* pixmap);
 
 } // namespace Velmar

@@ -1,17 +1,35 @@
-// The pixmap and bitmap objects around a port's image.
+// The pixmap and bitmap objects around a port's image or an image of their own.
 #include <Velmar/QtGrafPort.h>
+
+#include "foundation/LiveHandles.h"
 
 #include <QImage>
 
 namespace Velmar {
 
+using namespace Private;
+
 PixMapPtr* PixMapPtr::createPixMap(QImage* image, QtGrafPort* port, SInt16 pixelDepth)
 {
-    return new PixMapPtr(image, port, pixelDepth);
+    auto* pixmap = new PixMapPtr(image, port, pixelDepth, false);
+    LiveHandles<PixMapPtr>::instance().add(pixmap);
+    return pixmap;
+}
+
+PixMapPtr* PixMapPtr::createOwnedPixMap(QImage* image, SInt16 pixelDepth)
+{
+    auto* pixmap = new PixMapPtr(image, nullptr, pixelDepth, true);
+    LiveHandles<PixMapPtr>::instance().add(pixmap);
+    return pixmap;
 }
 
 void PixMapPtr::destroyPixMap(PixMapPtr* pixmap)
 {
+    if (!pixmap)
+        return;
+    LiveHandles<PixMapPtr>::instance().remove(pixmap);
+    if (pixmap->m_ownsImage)
+        delete pixmap->m_image;
     delete pixmap;
 }
 

@@ -6,6 +6,7 @@
 #include "resources/ImageCache.h"
 
 #include <QApplication>
+#include <QHash>
 #include <QIcon>
 #include <QPixmap>
 #include <QStyle>
@@ -91,12 +92,19 @@ AbstractIcon* standardIcon(SInt16 id)
     return new ColorIcon(image, hasPartialAlpha(image), id);
 }
 
-AbstractIcon* iconFromImage(ResType type, SInt16 id, const QImage& loaded)
+// What an icon PNG becomes once its type's mask rule has been applied.
+struct DerivedIcon {
+    QImage image; // null: the PNG could not be read
+    bool monochrome = false;
+    bool partialAlpha = false;
+};
+
+DerivedIcon deriveIcon(ResType type, const QImage& loaded)
 {
     if (loaded.isNull())
-        return new NullIcon;
+        return {};
     if (hasPartialAlpha(loaded))
-        return new ColorIcon(loaded, true, id);
+        return {loaded, false, true};
     QImage image = loaded.convertToFormat(QImage::Format_RGB32);
     bool monochrome = false;
     switch (maskRule(type)) {
@@ -112,9 +120,23 @@ AbstractIcon* iconFromImage(ResType type, SInt16 id, const QImage& loaded)
         break;
     }
     }
-    if (monochrome)
-        return new MonochromeIcon(image, false, id);
-    return new ColorIcon(image, false, id);
+    return {image, monochrome, false};
+}
+
+// Icons a host draws again and again are derived once: by type and ID, never emptied, like
+// the PNG cache under it. Missing PNGs are not remembered, so that resources a host
+// registers later are found.
+const DerivedIcon* derivedIcon(ResType type, SInt16 id)
+{
+    static auto* sDerived = new QHash<quint64, DerivedIcon>;
+    const quint64 key = (quint64(type) << 16) | quint16(id);
+    auto it = sDerived->constFind(key);
+    if (it != sDerived->constEnd())
+        return &it.value();
+    const QString path = MakeImageResourceName(type, id);
+    if (!resourceFileExists(path))
+        return nullptr;
+    return &sDerived->insert(key, deriveIcon(type, cachedIconImage(path))).value();
 }
 
 } // namespace
@@ -129,10 +151,12 @@ AbstractIcon* LoadIcon(ResType type, SInt16 id)
 {
     if (id >= 0 && id <= 2)
         return standardIcon(id);
-    const QString path = MakeImageResourceName(type, id);
-    if (!resourceFileExists(path))
+    const DerivedIcon* icon = derivedIcon(type, id);
+    if (!icon || icon->image.isNull())
         return new NullIcon;
-    return iconFromImage(type, id, cachedIconImage(path));
+    if (icon->monochrome)
+        return new MonochromeIcon(icon->image, icon->partialAlpha, id);
+    return new ColorIcon(icon->image, icon->partialAlpha, id);
 }
 
 } // namespace Velmar

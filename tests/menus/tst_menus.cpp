@@ -9,8 +9,11 @@
 #include "events/EventQueue.h"
 #include "menus/MenuPrivate.h"
 
+#include "../resources/Fixtures.h"
+
 #include <QMenuBar>
 #include <QPointer>
+#include <QResource>
 
 using namespace Velmar;
 
@@ -418,6 +421,32 @@ private Q_SLOTS:
         QVERIFY(Private::NeedsListPopup(QPoint(5, 5), longMenu.get()));
         AppendMenu(longMenu, P(pascal("-")));
         QVERIFY(!Private::NeedsListPopup(QPoint(5, 5), longMenu.get()));
+    }
+
+    // Icon n is resource n + 256: a colour icon, else a black-and-white one; a small icon for
+    // items whose command is 30. The fixture family 200 has every kind, 201 only 'SICN' of
+    // these, 202 nothing.
+    void itemIcons()
+    {
+        if (!QResource::registerResource(QStringLiteral(VELMAR_RESOURCE_FIXTURES)))
+            QSKIP("the resource fixtures are not built");
+        Menu m(360, "Colour;Small");
+        auto centre = [&](int item) {
+            return m->actions().at(item - 1)->icon().pixmap(32, 32).toImage().pixel(10, 10);
+        };
+        SetItemIcon(m, 1, 200 - 256);
+        QCOMPARE(centre(1), Fixtures::familyColour("cicn"));
+        SInt16 icon = 0;
+        GetItemIcon(m, 1, &icon);
+        QCOMPARE(icon, SInt16(200 - 256));
+        SetItemIcon(m, 1, 202 - 256); // nothing found: the icon stays
+        QCOMPARE(centre(1), Fixtures::familyColour("cicn"));
+        SetItemIcon(m, 1, 0);
+        QVERIFY(m->actions().at(0)->icon().isNull());
+        SetItemCmd(m, 2, kMenuSmallIconCmd);
+        SetItemIcon(m, 2, 201 - 256);
+        QCOMPARE(centre(2), Fixtures::familyColour("SICN"));
+        QResource::unregisterResource(QStringLiteral(VELMAR_RESOURCE_FIXTURES));
     }
 
     // Every call given a menu that is gone asserts once and answers its neutral result.

@@ -6,6 +6,7 @@
 #include <Velmar/Diagnostics.h>
 #include <Velmar/HostCore.h>
 #include <Velmar/QDIcons.h>
+#include <Velmar/QtGrafPort.h>
 #include <Velmar/Resources.h>
 #include <Velmar/TextUtils.h>
 
@@ -218,6 +219,28 @@ private Q_SLOTS:
         QCOMPARE(log.count(QStringLiteral("warning: refNum is not 0")), 1);
         QCOMPARE(CurResFile(), SInt16(0));
         SetLogCategory(kLogQuickDraw, false);
+    }
+
+    // A copied pixmap owns its own pixels; nothing is ever locked.
+    void pixmapHandles()
+    {
+        GrafPtr world = nullptr;
+        const Rect bounds{0, 0, 4, 4};
+        NewGWorld(&world, 32, &bounds, nullptr, nullptr, 0);
+        PixMapPtr* original = GetGWorldPixMap(world);
+        original->image()->fill(Qt::red);
+        PixMapPtr* copy = TxCopyHand(original);
+        QVERIFY(copy && copy->ownsImage() && copy->image() != original->image());
+        original->image()->fill(Qt::blue);
+        QCOMPARE(copy->image()->pixel(1, 1), qRgb(255, 0, 0));
+        QCOMPARE(TxHLock(copy), Boolean(1));
+        TxHUnLock(copy, 1);
+        PixMapPtr::destroyPixMap(copy);
+        QCOMPARE(TxCopyHand(static_cast<PixMapPtr*>(nullptr)), nullptr);
+        VelmarTest::IgnoredAssertions asserts;
+        QCOMPARE(TxCopyHand(copy), nullptr);
+        QCOMPARE(asserts.texts(), QStringList{"IsValidPixMap(pixmap)"});
+        DisposeGWorld(world);
     }
 };
 
