@@ -101,6 +101,8 @@ VELMAR_EXPORT WindowRef NewCWindow(void* handler, const Rect* bounds, ConstStr25
                                    Boolean visible, SInt16 procID, WindowRef behind,
                                    Boolean goAwayFlag, void* refCon);
 VELMAR_EXPORT void DisposeWindow(WindowRef window);
+// True for a window that is alive and not disposed; never asserts (any pointer may be asked).
+VELMAR_EXPORT Boolean IsValidWindowPtr(WindowRef window);
 
 // ---- Visibility, size and place ---------------------------------------------------------------
 VELMAR_EXPORT void ShowWindow(WindowRef window);

@@ -1,6 +1,8 @@
 // Which windows exist, the front-to-back window list and the dirty-port set.
 #include "windows/WindowPrivate.h"
 
+#include <Velmar/Windows.h>
+
 #include <algorithm>
 
 namespace Velmar::Private {
@@ -136,3 +138,12 @@ QEvent::Type focusRequestEventType()
 }
 
 } // namespace Velmar::Private
+
+namespace Velmar {
+
+Boolean IsValidWindowPtr(WindowRef window)
+{
+    return Private::isLive(window.get()) && !window->IsDeletePending();
+}
+
+} // namespace Velmar
