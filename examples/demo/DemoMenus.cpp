@@ -1,5 +1,6 @@
 #include "DemoMenus.h"
 
+#include "DemoEditor.h"
 #include "DemoText.h"
 
 using namespace Velmar;
@@ -58,6 +59,13 @@ void updateMenus()
     CheckMenuItem(style, 2, (s.face & bold) != 0);
     CheckMenuItem(style, 3, (s.face & italic) != 0);
     CheckMenuItem(style, 4, (s.face & underline) != 0);
+    // The Edit menu serves the Notes window.
+    MenuRef edit = GetMenuHandle(kEditMenu);
+    const bool notes = editorIsFront();
+    (notes && editorCanUndo() ? EnableMenuItem : DisableMenuItem)(edit, 1);
+    for (UInt16 item : {3, 4, 6})
+        (notes && editorHasSelection() ? EnableMenuItem : DisableMenuItem)(edit, item);
+    (notes ? EnableMenuItem : DisableMenuItem)(edit, 5);
     MenuRef size = GetMenuHandle(kSizeMenu);
     for (UInt16 i = 1; i <= CountMenuItems(size); ++i)
         CheckMenuItem(size, SInt16(i), itemText(size, i).toInt() == s.size);
@@ -80,13 +88,19 @@ void installMenus(std::function<void(Command)> run)
     // The Window menu is the anchor: menus appended with beforeID 0 go in front of it.
     InsertMenu(makeMenu(kMenuBarAnchorID, "Window", "Show Palette"), kMenuBarAnchorID);
     InsertMenu(makeMenu(kAppMenu, "Velmar", "About the Velmar Demo"), 0);
-    MenuRef file = makeMenu(kFileMenu, "File", "New Document;Fonts and Icons;-;Close;-;Quit");
+    MenuRef file = makeMenu(kFileMenu, "File", "New Document;Fonts and Icons;Notes;-;Close;-;Quit");
     SetItemCmd(file, 1, 'N');
     SetItemCmd(file, 2, 'T');
-    SetItemCmd(file, 4, 'W');
-    SetItemCmd(file, 6, 'Q');
+    SetItemCmd(file, 3, 'E');
+    SetItemCmd(file, 5, 'W');
+    SetItemCmd(file, 7, 'Q');
     InsertMenu(file, 0);
-    InsertMenu(makeMenu(kEditMenu, "Edit", "(Undo;-;(Cut;(Copy;(Paste;(Clear"), 0);
+    MenuRef edit = makeMenu(kEditMenu, "Edit", "Undo;-;Cut;Copy;Paste;Clear");
+    SetItemCmd(edit, 1, 'Z');
+    SetItemCmd(edit, 3, 'X');
+    SetItemCmd(edit, 4, 'C');
+    SetItemCmd(edit, 5, 'V');
+    InsertMenu(edit, 0);
     MenuRef font = makeMenu(kFontMenu, "Font", nullptr);
     AppendResMenu(font, FOUR_CHAR_CODE("FONT"));
     InsertMenu(font, 0);
@@ -116,6 +130,13 @@ void doMenuChoice(SInt32 choice)
             Command::None, Command::Close, Command::None, Command::Quit};
         if (item < std::size(kFile))
             gRun(kFile[item]);
+        return;
+    }
+    case kEditMenu: {
+        static const EditCommand kEdit[] = {EditCommand::Undo, EditCommand::Undo, EditCommand::Undo,
+            EditCommand::Cut, EditCommand::Copy, EditCommand::Paste, EditCommand::Clear};
+        if (item >= 1 && item < std::size(kEdit) && item != 2 && editorIsFront())
+            editCommand(kEdit[item]);
         return;
     }
     case kMenuBarAnchorID: gRun(Command::ShowPalette); return;

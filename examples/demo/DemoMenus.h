@@ -9,7 +9,7 @@
 
 namespace Demo {
 
-enum class Command { None, NewDocument, FontsWindow, Close, Quit, About, ShowPalette };
+enum class Command { None, NewDocument, FontsWindow, NotesWindow, Close, Quit, About, ShowPalette };
 
 // Builds the menus; `run` carries out the commands that are not about text.
 void installMenus(std::function<void(Command)> run);

@@ -7,6 +7,7 @@
 // animates the front window. With --screenshot PATH it saves the screen after a few
 // seconds and quits, for machines without a display.
 #include "DemoDocuments.h"
+#include "DemoEditor.h"
 #include "DemoMenus.h"
 #include "DemoText.h"
 
@@ -45,6 +46,10 @@ void closeFront()
     WindowRef front = FrontWindow();
     if (!front || front == gDemo.palette)
         return;
+    if (isEditorWindow(front)) {
+        closeEditorWindow();
+        return;
+    }
     forgetDocument(front);
     if (front == gDemo.dialog)
         gDemo.dialog = nullptr;
@@ -56,6 +61,7 @@ void run(Command command)
     switch (command) {
     case Command::NewDocument: openNewDocument(); break;
     case Command::FontsWindow: openTextWindow(); break;
+    case Command::NotesWindow: openEditorWindow(); break;
     case Command::Close: closeFront(); break;
     case Command::Quit: gDemo.quit = true; break;
     case Command::About: SysBeep(1); break;
@@ -83,10 +89,14 @@ void handleMouseDown(const EventRecord& e)
     }
     if (isTextWindow(w) && clickTextWindow(w, e.where))
         return;
+    if (isEditorWindow(w)) {
+        clickEditor(e);
+        return;
+    }
     clickDocument(w, e, part);
 }
 
-void handleKeyDown(const EventRecord& e)
+void handleKeyDown(EventRecord& e)
 {
     if (gDemo.dialog) { // any key dismisses the dialog
         forgetDocument(gDemo.dialog);
@@ -98,6 +108,10 @@ void handleKeyDown(const EventRecord& e)
         doMenuChoice(SInt32(MenuEvent(&e)));
         return;
     }
+    if (editorIsFront()) {
+        keyEditor(e);
+        return;
+    }
     const char c = char(e.message & charCodeMask);
     if (c == 'z' && FrontWindow()) {
         static bool out = false;
@@ -106,7 +120,7 @@ void handleKeyDown(const EventRecord& e)
     }
 }
 
-void handleEvent(const EventRecord& e)
+void handleEvent(EventRecord& e)
 {
     switch (e.what) {
     case updateEvt:
@@ -114,11 +128,15 @@ void handleEvent(const EventRecord& e)
         BeginUpdate(e.window);
         if (isTextWindow(e.window))
             drawTextWindow(e.window);
+        else if (isEditorWindow(e.window))
+            drawEditorWindow(e.window);
         else
             drawDocument(e.window, e.window == FrontWindow());
         EndUpdate(e.window);
         break;
     case activateEvt:
+        if (isEditorWindow(e.window))
+            activateEditor((e.modifiers & activeFlag) != 0);
         if (isDocument(e.window)) { // the shape's colour follows activation
             Rect all;
             GetWindowPortBounds(e.window, &all);
@@ -146,6 +164,7 @@ void openStartWindows()
     gDemo.documents.push_back(
         openDocument(0, 330, 40, "Document", RGBColor(0xF0F0, 0xF8F8, 0xFFFF)));
     openTextWindow();
+    openEditorWindow();
 
     // A floating palette and a movable modal dialog from Carbon classes.
     const Rect paletteBounds{80, 1040, 300, 1180};
@@ -155,7 +174,7 @@ void openStartWindows()
     adoptAsDocument(gDemo.palette, RGBColor(0xE0E0, 0xE0E0, 0xE0E0), Rect{20, 20, 70, 110});
     ShowWindow(gDemo.palette);
 
-    const Rect dialogBounds{600, 420, 700, 740};
+    const Rect dialogBounds{560, 820, 660, 1140};
     CreateNewWindow(kMovableModalWindowClass, 0, &dialogBounds, &gDemo.dialog);
     SetWTitle(gDemo.dialog,
         reinterpret_cast<const unsigned char*>("\x17"
