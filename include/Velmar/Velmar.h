@@ -26,3 +26,4 @@
 #include <Velmar/Resources.h>
 #include <Velmar/QDIcons.h>
 #include <Velmar/Menus.h>
+#include <Velmar/Scrap.h>
