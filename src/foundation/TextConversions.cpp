@@ -3,6 +3,8 @@
 
 #include <Velmar/HostEncoding.h>
 
+#include "host/MacEncodingAscii.h"
+
 #include <QVarLengthArray>
 
 #include <algorithm>
@@ -19,14 +21,22 @@ QString MakeQString(const char* text, SInt32 length)
         return QString();
     if (n > size_t(INT32_MAX) - 1)
         return QString();
+    // Pure ASCII in an encoding that keeps ASCII: Qt's vectorised Latin-1 route. An embedded
+    // NUL ends the text, as the conversion below would end it.
+    if (Private::asciiPassesUnchanged()) {
+        const void* nul = std::memchr(text, 0, n);
+        const qsizetype length = nul ? static_cast<const char*>(nul) - text : qsizetype(n);
+        if (QtPrivate::isAscii(QLatin1StringView(text, length)))
+            return length ? QString::fromLatin1(text, length) : QString();
+    }
 
     // Grow until the whole conversion fits; one spare unit keeps the buffer terminated.
     // Pascal strings (the common case, drawn on every DrawString) fit on the stack.
     QVarLengthArray<unsigned short, 256 + 1> buffer(qsizetype(n) + 1);
     for (;;) {
         std::fill(buffer.begin(), buffer.end(), 0);
-        const SInt32 needed = CurrentMacMBCSEncodingToUTF16(text, int(n), buffer.data(),
-                                                            int(buffer.size()));
+        const SInt32 needed =
+            CurrentMacMBCSEncodingToUTF16(text, int(n), buffer.data(), int(buffer.size()));
         if (needed < SInt32(buffer.size()))
             break;
         if (needed >= INT32_MAX)
@@ -39,6 +49,14 @@ QString MakeQString(const char* text, SInt32 length)
 
 QByteArray MakeLocal8Bit(const QString& s)
 {
+    if (Private::asciiPassesUnchanged() && QtPrivate::isAscii(QStringView(s))) {
+        QByteArray bytes = s.toLatin1();
+        const qsizetype nul = bytes.indexOf('\0');
+        if (nul >= 0)
+            bytes.truncate(nul);
+        bytes.append('\0'); // part of the array, as below
+        return bytes;
+    }
     const qsizetype length = s.size();
     const qsizetype capacity = (length + 1) * 4;
     if (capacity > INT32_MAX) // beyond what the 32-bit conversion call can describe
@@ -46,7 +64,7 @@ QByteArray MakeLocal8Bit(const QString& s)
     QByteArray bytes(capacity, '\0');
     bool lossy = false;
     UTF16ToCurrentMacMBCSEncoding(reinterpret_cast<const unsigned short*>(s.utf16()),
-                                  SInt32(length), bytes.data(), SInt32(capacity), &lossy);
+        SInt32(length), bytes.data(), SInt32(capacity), &lossy);
     // Keep the text and its terminating NUL, deliberately part of the array.
     bytes.truncate(qstrnlen(bytes.constData(), size_t(capacity - 1)) + 1);
     return bytes;
@@ -83,7 +101,8 @@ QString FourCharToString(UInt32 code)
 QString ptrToString(const void* p)
 {
     return QStringLiteral("0x")
-        + QStringLiteral("%1").arg(quint64(reinterpret_cast<quintptr>(p)), 16, 16, QLatin1Char('0'));
+        + QStringLiteral("%1").arg(
+            quint64(reinterpret_cast<quintptr>(p)), 16, 16, QLatin1Char('0'));
 }
 
 } // namespace Velmar

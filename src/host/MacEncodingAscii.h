@@ -1,0 +1,13 @@
+// Whether the current Macintosh encoding leaves ASCII as it is, so that text conversions may
+// take Qt's fast Latin-1 routes for pure-ASCII text.
+#pragma once
+
+namespace Velmar::Private {
+
+// True when bytes 0x01-0x7F convert to the same code points and back (checked once per
+// encoding: Shift_JIS, for one, may give a yen sign for 0x5C).
+bool asciiPassesUnchanged();
+// Called whenever the current encoding or the host's converter changes (checks it at once).
+void encodingChanged();
+
+} // namespace Velmar::Private
