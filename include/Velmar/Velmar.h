@@ -27,3 +27,4 @@
 #include <Velmar/QDIcons.h>
 #include <Velmar/Menus.h>
 #include <Velmar/Scrap.h>
+#include <Velmar/Drag.h>

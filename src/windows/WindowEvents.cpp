@@ -90,6 +90,14 @@ bool AQtWindow::event(QEvent* e)
         ActivateWindow(e->type() == QEvent::WindowActivate);
         e->accept();
         return true;
+    case QEvent::DragEnter:
+    case QEvent::DragMove:
+    case QEvent::DragLeave:
+    case QEvent::Drop:
+        if (const WindowFilterHooks& hooks = windowFilterHooks(); hooks.dragEvent)
+            return hooks.dragEvent(this, e);
+        e->ignore();
+        return true;
     default:
         break;
     }

@@ -1,6 +1,6 @@
 // Where managers above windows look at a window's Qt events first: the inspector's debugging
-// shortcuts, key handling for events that convert to nothing, and input-method text for the
-// TextEdit record whose editor the window stands in for. Unset, nothing is looked at.
+// shortcuts, key handling for events that convert to nothing, input-method text for the
+// TextEdit record whose editor the window stands in for, and drags. Unset, nothing is looked at.
 #pragma once
 
 #include <Velmar/AQtWindow.h>
@@ -14,6 +14,9 @@ struct WindowFilterHooks {
     bool (*specialEvent)(AQtWindow* window, QEvent* e) = nullptr;
     bool (*unconvertedEvent)(AQtWindow* window, QEvent* e) = nullptr;
     void (*forwardInputMethod)(CommonTextEditAPI* edit, QInputMethodEvent* e) = nullptr;
+    // Drags entering, moving over, leaving and dropping on the window. Unset, the window
+    // takes no drags.
+    bool (*dragEvent)(AQtWindow* window, QEvent* e) = nullptr;
 };
 
 const WindowFilterHooks& windowFilterHooks();

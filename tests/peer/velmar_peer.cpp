@@ -34,6 +34,7 @@ protected:
     void dropEvent(QDropEvent* e) override
     {
         const QMimeData* data = e->mimeData();
+        say(QStringLiteral("formats: ") + data->formats().join(QLatin1Char(',')));
         for (const QUrl& url : data->urls())
             say(QStringLiteral("url: ") + url.toString());
         if (data->hasText())
