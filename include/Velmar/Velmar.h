@@ -28,3 +28,4 @@
 #include <Velmar/Menus.h>
 #include <Velmar/Scrap.h>
 #include <Velmar/Drag.h>
+#include <Velmar/Cursors.h>

@@ -1,0 +1,93 @@
+// Setting, hiding and obscuring the cursor: every call is a push or a pop on Qt's
+// application override-cursor stack, the table keeping only whether the cursor is hidden or
+// obscured.
+#include "cursors/CursorPrivate.h"
+
+#include <QGuiApplication>
+
+namespace Velmar {
+
+using namespace Private;
+
+namespace {
+
+bool sameShape(const QCursor& a, const QCursor& b)
+{
+    return a.shape() != Qt::BitmapCursor && a.shape() == b.shape();
+}
+
+void popOverrideCursor()
+{
+    QGuiApplication::restoreOverrideCursor(); // nothing when the stack is empty
+}
+
+} // namespace
+
+void SetCCursor(CursPtr* cursor)
+{
+    if (!VELMAR_CHECK_CURSOR(cursor))
+        return;
+    cursorTable(); // a host's first cursor call installs the activation hook
+    const QCursor wanted = cursor->getCursor();
+    // Hosts set the cursor on every mouse move: the same shape again must not grow the stack.
+    if (const QCursor* showing = QGuiApplication::overrideCursor();
+        showing && sameShape(*showing, wanted))
+        return;
+    QGuiApplication::setOverrideCursor(wanted);
+}
+
+void HideCursor()
+{
+    CursorTable& table = cursorTable();
+    if (table.hidden)
+        return;
+    QGuiApplication::setOverrideCursor(QCursor(Qt::BlankCursor));
+    table.hidden = true;
+}
+
+void ObscureCursor()
+{
+    QGuiApplication::setOverrideCursor(QCursor(Qt::BlankCursor));
+    cursorTable().obscured = true;
+}
+
+void ShowCursor()
+{
+    CursorTable& table = cursorTable();
+    if (!table.hidden && !table.obscured)
+        return;
+    popOverrideCursor();
+    table.hidden = false;
+    table.obscured = false;
+}
+
+void RestoreObscuredCursor()
+{
+    if (cursorTable().obscured)
+        ShowCursor();
+}
+
+Boolean CursorObscured()
+{
+    return cursorTable().obscured;
+}
+
+void InitCursor()
+{
+    RemoveOverrideCursor();
+    ShowCursor();
+}
+
+void RemoveOverrideCursor()
+{
+    cursorTable(); // the first cursor call of a host installs the activation hook
+    while (QGuiApplication::overrideCursor())
+        popOverrideCursor();
+}
+
+AutoRestoreCursor::~AutoRestoreCursor()
+{
+    popOverrideCursor();
+}
+
+} // namespace Velmar
