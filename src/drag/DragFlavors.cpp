@@ -3,11 +3,13 @@
 #include <Velmar/Events.h>
 #include <Velmar/TextUtils.h>
 
+#include "cursors/CursorPrivate.h"
 #include "drag/DragPrivate.h"
 #include "foundation/Conversions.h"
 #include "foundation/LiveHandles.h"
 
 #include <QCursor>
+#include <QDrag>
 #include <QPixmap>
 
 #include <cstring>
@@ -177,6 +179,16 @@ const QMimeData* GetDragData(Drag* drag)
 OSErr SetDragSendProc(Drag* drag, DragSendDataUPP, void*)
 {
     return usableDrag(drag, false) ? OSErr(noErr) : OSErr(badDragRefErr);
+}
+
+// The picture of the cursor (a shape cursor has none: Qt's own drag cursor stays).
+void SetDragCursor(CursPtr* cursor)
+{
+    if (!cursor || !VELMAR_CHECK_CURSOR(cursor))
+        return;
+    dragCursorPixmap() = cursor->getCursor().pixmap();
+    if (Drag* drag = DragInstance(); drag && drag->m_qdrag && !dragCursorPixmap().isNull())
+        drag->m_qdrag->setDragCursor(dragCursorPixmap(), Qt::MoveAction);
 }
 
 Boolean IsDragTracking(Drag* drag)

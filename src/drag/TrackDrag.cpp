@@ -1,12 +1,12 @@
 // TrackDrag: the host's outline as the drag's picture, the start check, then Qt's drag.
 #include <Velmar/AQtWindow.h>
+#include <Velmar/Cursors.h>
 #include <Velmar/Drag.h>
 #include <Velmar/MacErrors.h>
 
 #include "drag/DragPrivate.h"
 #include "drag/DragStartChecker.h"
 #include "drag/DragTabSwitcher.h"
-#include "foundation/ApplicationPrivate.h"
 #include "foundation/Conversions.h"
 #include "foundation/LiveHandles.h"
 
@@ -122,9 +122,7 @@ OSErr TrackDrag(Drag* drag, const EventRecord* event, RgnHandle region)
         alive->m_mimeData = nullptr;
         alive->clearTarget();
     }
-    // The arrow again (InitCursor, once the cursor calls are in use).
-    if (auto initCursor = applicationHooks().initCursor)
-        initCursor();
+    InitCursor();
     return dragNotAcceptedErr;
 }
 
