@@ -109,10 +109,11 @@ VELMAR_EXPORT void InitCursor();
 // Pops every override cursor.
 VELMAR_EXPORT void RemoveOverrideCursor();
 
-// Pops one override cursor when the scope ends, whatever was pushed within it.
+// Pops one override cursor when the scope ends, whatever was pushed within it: the first
+// SetCCursor within the scope pushes its cursor.
 class VELMAR_EXPORT AutoRestoreCursor {
 public:
-    AutoRestoreCursor() = default;
+    AutoRestoreCursor();
     ~AutoRestoreCursor();
     AutoRestoreCursor(const AutoRestoreCursor&) = delete;
     AutoRestoreCursor& operator=(const AutoRestoreCursor&) = delete;

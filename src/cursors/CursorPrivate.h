@@ -25,6 +25,10 @@ struct CursorTable {
     QCursor defaultCursor{Qt::ArrowCursor};
     bool hidden = false;
     bool obscured = false;
+    // The top of the override stack is the cursor SetCCursor pushed last: the next one
+    // replaces it instead of pushing, so that hosts setting cursors on every mouse move do
+    // not grow the stack.
+    bool setCursorOnTop = false;
 };
 CursorTable& cursorTable();
 

@@ -19,6 +19,13 @@ bool sameShape(const QCursor& a, const QCursor& b)
 void popOverrideCursor()
 {
     QGuiApplication::restoreOverrideCursor(); // nothing when the stack is empty
+    cursorTable().setCursorOnTop = false;
+}
+
+void pushOverrideCursor(const QCursor& cursor)
+{
+    QGuiApplication::setOverrideCursor(cursor);
+    cursorTable().setCursorOnTop = false;
 }
 
 } // namespace
@@ -30,10 +37,16 @@ void SetCCursor(CursPtr* cursor)
     cursorTable(); // a host's first cursor call installs the activation hook
     const QCursor wanted = cursor->getCursor();
     // Hosts set the cursor on every mouse move: the same shape again must not grow the stack.
-    if (const QCursor* showing = QGuiApplication::overrideCursor();
-        showing && sameShape(*showing, wanted))
+    const QCursor* showing = QGuiApplication::overrideCursor();
+    if (showing && sameShape(*showing, wanted))
         return;
-    QGuiApplication::setOverrideCursor(wanted);
+    CursorTable& table = cursorTable();
+    if (showing && table.setCursorOnTop) {
+        QGuiApplication::changeOverrideCursor(wanted);
+        return;
+    }
+    pushOverrideCursor(wanted);
+    table.setCursorOnTop = true;
 }
 
 void HideCursor()
@@ -41,13 +54,13 @@ void HideCursor()
     CursorTable& table = cursorTable();
     if (table.hidden)
         return;
-    QGuiApplication::setOverrideCursor(QCursor(Qt::BlankCursor));
+    pushOverrideCursor(QCursor(Qt::BlankCursor));
     table.hidden = true;
 }
 
 void ObscureCursor()
 {
-    QGuiApplication::setOverrideCursor(QCursor(Qt::BlankCursor));
+    pushOverrideCursor(QCursor(Qt::BlankCursor));
     cursorTable().obscured = true;
 }
 
@@ -83,6 +96,11 @@ void RemoveOverrideCursor()
     cursorTable(); // the first cursor call of a host installs the activation hook
     while (QGuiApplication::overrideCursor())
         popOverrideCursor();
+}
+
+AutoRestoreCursor::AutoRestoreCursor()
+{
+    cursorTable().setCursorOnTop = false;
 }
 
 AutoRestoreCursor::~AutoRestoreCursor()

@@ -106,8 +106,9 @@ private Q_SLOTS:
             {"show pops the hide, not the cursor", "set:4 hide show", "wait", false},
             {"same shape once", "set:1 set:1", "ibeam", false},
             {"two IDs, one shape", "set:2 set:3", "cross", false},
-            {"another shape pushed", "set:1 set:0", "arrow ibeam", false},
-            {"pictures always pushed", "set:6608 set:6608", "picture picture", false},
+            {"another shape replaces the last set", "set:1 set:0", "arrow", false},
+            {"pictures replace too", "set:6608 set:6608", "picture", false},
+            {"a set after a hide pushes", "set:1 hide show set:4", "wait ibeam", false},
             {"remove pops all", "set:1 set:4 set:0 remove", "", false},
             {"init after set", "set:4 init", "", false},
         };
