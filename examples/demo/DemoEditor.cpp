@@ -117,6 +117,12 @@ bool editorCanUndo()
     return gRecord && gRecord->canUndo();
 }
 
+void insertIntoEditor(const char* text, SInt32 length)
+{
+    if (gRecord)
+        TEInsert(text, length, gRecord);
+}
+
 void closeEditorWindow()
 {
     if (gRecord)

@@ -21,5 +21,7 @@ bool editorIsFront();
 bool editorHasSelection();
 bool editorCanUndo();
 void closeEditorWindow();
+// Text (in the host's encoding) inserted at the caret.
+void insertIntoEditor(const char* text, Velmar::SInt32 length);
 
 } // namespace Demo

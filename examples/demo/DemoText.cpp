@@ -1,5 +1,7 @@
 #include "DemoText.h"
 
+#include "DemoDesktop.h"
+
 #include <QByteArray>
 
 using namespace Velmar;
@@ -215,6 +217,7 @@ void drawTextWindow(WindowRef window)
     drawTextResource();
     drawSample();
     drawPopUp();
+    drawDesktopBoxes();
 }
 
 bool clickTextWindow(WindowRef window, Point where)

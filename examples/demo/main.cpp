@@ -6,6 +6,7 @@
 // command keys (Control plays the command key) drive the demo; idle time (null events)
 // animates the front window. With --screenshot PATH it saves the screen after a few
 // seconds and quits, for machines without a display.
+#include "DemoDesktop.h"
 #include "DemoDocuments.h"
 #include "DemoEditor.h"
 #include "DemoMenus.h"
@@ -87,7 +88,7 @@ void handleMouseDown(const EventRecord& e)
         SelectWindow(w);
         return;
     }
-    if (isTextWindow(w) && clickTextWindow(w, e.where))
+    if (isTextWindow(w) && (clickTextWindow(w, e.where) || dragFromBox(w, e)))
         return;
     if (isEditorWindow(w)) {
         clickEditor(e);
@@ -163,8 +164,9 @@ void openStartWindows()
         openDocument(8, 60, 40, "Document (zoom box)", RGBColor(0xFFFF, 0xFFFF, 0xF0F0)));
     gDemo.documents.push_back(
         openDocument(0, 330, 40, "Document", RGBColor(0xF0F0, 0xF8F8, 0xFFFF)));
-    openTextWindow();
-    openEditorWindow();
+    const WindowRef fonts = openTextWindow();
+    const WindowRef notes = openEditorWindow();
+    installDesktop(fonts, notes);
 
     // A floating palette and a movable modal dialog from Carbon classes.
     const Rect paletteBounds{80, 1040, 300, 1180};
@@ -215,6 +217,8 @@ int main(int argc, char** argv)
         } else if (WindowRef front = FrontWindow(); front && isDocument(front)) {
             SetPortWindowPort(front);
             animate(front);
+        } else {
+            trackMouse();
         }
         if (!screenshot.isEmpty() && clock.elapsed() > 2500) {
             QScreen* screen = QGuiApplication::primaryScreen();
