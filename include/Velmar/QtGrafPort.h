@@ -69,12 +69,17 @@ public:
 
     SInt16 pixelDepth() const { return m_pixelDepth; }
     bool ownsImage() const { return m_ownsImage; }
+    // Local coordinates of the top-left pixel: the port's origin, or the pixmap's own.
+    QPoint origin() const;
+    // An owned pixmap's pixels are replaced (the old ones freed) and placed at `origin`.
+    void replaceImage(QImage* image, const QPoint& origin);
 
 private:
     PixMapPtr(QImage* image, QtGrafPort* port, SInt16 depth, bool owns)
         : BitMapPtr(image, port), m_pixelDepth(depth), m_ownsImage(owns) {}
     SInt16 m_pixelDepth;
     bool m_ownsImage;
+    QPoint m_origin;
 };
 
 namespace Private {

@@ -19,6 +19,7 @@
 #include <Velmar/QDRegions.h>
 #include <Velmar/QDShapes.h>
 #include <Velmar/QDText.h>
+#include <Velmar/QDBitmaps.h>
 #include <Velmar/TextEdit.h>
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>

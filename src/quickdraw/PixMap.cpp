@@ -33,6 +33,20 @@ void PixMapPtr::destroyPixMap(PixMapPtr* pixmap)
     delete pixmap;
 }
 
+QPoint PixMapPtr::origin() const
+{
+    return m_port ? m_port->origin() : m_origin;
+}
+
+void PixMapPtr::replaceImage(QImage* image, const QPoint& origin)
+{
+    if (!m_ownsImage)
+        return;
+    delete m_image;
+    m_image = image;
+    m_origin = origin;
+}
+
 void BitMapPtr::clear() const
 {
     if (!m_image || !m_port)

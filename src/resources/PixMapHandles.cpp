@@ -21,8 +21,9 @@ PixMapPtr* TxCopyHand(PixMapPtr* pixmap)
     if (!pixmap || !VELMAR_LIVE(pixmap, "IsValidPixMap(pixmap)"))
         return nullptr;
     const QImage* image = pixmap->image();
-    return PixMapPtr::createOwnedPixMap(
-        image ? new QImage(image->copy()) : nullptr, pixmap->pixelDepth());
+    PixMapPtr* copy = PixMapPtr::createOwnedPixMap(nullptr, pixmap->pixelDepth());
+    copy->replaceImage(image ? new QImage(image->copy()) : nullptr, pixmap->origin());
+    return copy;
 }
 
 } // namespace Velmar

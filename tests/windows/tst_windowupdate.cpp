@@ -3,6 +3,7 @@
 // the window's own events take the Toolbox's shape.
 #include "WindowTestSupport.h"
 
+#include <Velmar/QDBitmaps.h>
 #include <Velmar/QDShapes.h>
 #include <Velmar/FeatureFlags.h>
 #include <Velmar/QuickDraw.h>
@@ -102,6 +103,37 @@ private Q_SLOTS:
         QVERIFY(!w->isGrafPortDirty());
         QTRY_COMPARE(screenPixels(QRect(w->mapToGlobal(QPoint(5, 5)), QSize(1, 1))).pixel(0, 0),
                      qRgb(0, 0, 255));
+    }
+
+    // A copy is drawing like any other: the window goes dirty and the screen shows it. The
+    // strip a scroll uncovers, made invalid, joins what was already invalid.
+    void copiesAndScrolls()
+    {
+        Window w(R(160, 180, 260, 380));
+        w.show();
+        GrafPtr world = nullptr;
+        const Rect all = R(0, 0, 100, 200);
+        QCOMPARE(NewGWorld(&world, 32, &all, nullptr, nullptr, 0), SInt16(noErr));
+        world->image()->fill(qRgb(0, 160, 0));
+        OnPort port(w);
+        RepaintDirtyPorts(true);
+        QVERIFY(!w->isGrafPortDirty());
+        CopyBits(GetPortBitMapForCopyBits(world), GetPortBitMapForCopyBits(GetWindowPort(w)),
+                 &all, &all, srcCopy, nullptr);
+        QVERIFY(w->isGrafPortDirty());
+        RepaintDirtyPorts(true);
+        QTRY_COMPARE(screenPixels(QRect(w->mapToGlobal(QPoint(60, 30)), QSize(1, 1))).pixel(0, 0),
+                     qRgb(0, 160, 0));
+        DisposeGWorld(world);
+
+        ValidWindowRect(w, &all);
+        const Rect early = R(50, 60, 55, 65);
+        InvalWindowRect(w, &early);
+        RgnHandle uncovered = NewRgn();
+        ScrollRect(&all, 0, 20, uncovered);
+        QCOMPARE(InvalWindowRgn(w, uncovered), noErr);
+        QCOMPARE(w->updateRegion(), QRegion(0, 0, 200, 20) + QRegion(60, 50, 5, 5));
+        DisposeRgn(uncovered);
     }
 
     // A handler paints what is invalid; painting does not validate (BeginUpdate does).
