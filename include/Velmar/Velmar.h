@@ -23,6 +23,7 @@
 #include <Velmar/TextEdit.h>
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>
+#include <Velmar/AQSlider.h>
 #include <Velmar/Windows.h>
 #include <Velmar/Resources.h>
 #include <Velmar/QDIcons.h>
