@@ -86,7 +86,7 @@ void installMenus(std::function<void(Command)> run)
 {
     gRun = std::move(run);
     // The Window menu is the anchor: menus appended with beforeID 0 go in front of it.
-    InsertMenu(makeMenu(kMenuBarAnchorID, "Window", "Show Palette"), kMenuBarAnchorID);
+    InsertMenu(makeMenu(kMenuBarAnchorID, "Window", "Show Palette;Velmar Inspector"), kMenuBarAnchorID);
     InsertMenu(makeMenu(kAppMenu, "Velmar", "About the Velmar Demo"), 0);
     MenuRef file = makeMenu(kFileMenu, "File", "New Document;Fonts and Icons;Notes;-;Close;-;Quit");
     SetItemCmd(file, 1, 'N');
@@ -139,7 +139,12 @@ void doMenuChoice(SInt32 choice)
             editCommand(kEdit[item]);
         return;
     }
-    case kMenuBarAnchorID: gRun(Command::ShowPalette); return;
+    case kMenuBarAnchorID:
+        if (item == 2)
+            ToggleVelmarInspector(); // the library's debugging window, for a look inside
+        else
+            gRun(Command::ShowPalette);
+        return;
     case kFontMenu: {
         Str255 name;
         GetMenuItemText(GetMenuHandle(kFontMenu), item, name);

@@ -24,6 +24,7 @@
 #include <Velmar/AQtWindow.h>
 #include <Velmar/AQtWinGDImage.h>
 #include <Velmar/AQSlider.h>
+#include <Velmar/Inspector.h>
 #include <Velmar/Windows.h>
 #include <Velmar/Resources.h>
 #include <Velmar/QDIcons.h>

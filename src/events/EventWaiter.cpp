@@ -153,6 +153,21 @@ VelmarEventWaiter* VelmarEventWaiter::topMost()
     return gTopMostWaiter;
 }
 
+VelmarEventWaiter* VelmarEventWaiter::interrupted() const
+{
+    return m_d->previous;
+}
+
+UInt32 VelmarEventWaiter::typeCount() const
+{
+    return m_d->typeCount;
+}
+
+bool VelmarEventWaiter::isLoopRunning() const
+{
+    return m_d->pEventLoop != nullptr;
+}
+
 void VelmarEventWaiter::setNullEventTimerEnabled(bool on)
 {
     gNullEventTimerEnabled = on;

@@ -30,6 +30,12 @@ public:
 
     Mode mode() const;
     static VelmarEventWaiter* topMost();
+    // Read-only views for the inspector: the waiter this one interrupted (the stack runs from
+    // topMost() through these), how many event types it waits for (0: any), and whether its
+    // nested loop is running.
+    VelmarEventWaiter* interrupted() const;
+    UInt32 typeCount() const;
+    bool isLoopRunning() const;
 
     // The wait itself. On success `out` holds the event (taken out of the queue when `pull`).
     // eventLoopTimedOutErr when nothing matching came within `timeout` seconds (negative:

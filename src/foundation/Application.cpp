@@ -10,6 +10,7 @@
 #include "events/EventQueue.h"
 #include "foundation/ApplicationPrivate.h"
 #include "foundation/MessageHandler.h"
+#include "inspector/InspectorShortcut.h"
 
 #include <QAction>
 #include <QIcon>
@@ -65,6 +66,16 @@ bool inspectorCopyBitsToScreen()
     return gInspectorCopyBitsToScreen;
 }
 
+void setInspectorEnabled(bool on)
+{
+    gInspectorEnabled = on;
+}
+
+void setInspectorCopyBitsToScreen(bool on)
+{
+    gInspectorCopyBitsToScreen = on;
+}
+
 } // namespace Private
 
 AQtApplication::AQtApplication(int& argc, char** argv, bool decorationFlag)
@@ -81,6 +92,9 @@ AQtApplication::AQtApplication(int& argc, char** argv, bool decorationFlag)
         Private::gInspectorCopyBitsToScreen =
             inspector.value(QStringLiteral("copyBitsToScreen"), false).toBool();
     }
+    // The application is where the managers are put together, the inspector among them.
+    if (Private::gInspectorEnabled)
+        Private::Inspector::installInspectorShortcut();
 
     if (QStyle* style = QStyleFactory::create(QStringLiteral("Windows")))
         setStyle(style);

@@ -56,9 +56,12 @@ struct ApplicationHooks {
 const ApplicationHooks& applicationHooks();
 ApplicationHooks SetApplicationHooks(const ApplicationHooks& hooks); // returns the old set
 
-// The debug inspector's two settings, read when the application is constructed.
+// The debug inspector's two settings, read when the application is constructed. The
+// setters change the running process only; the inspector stores them in the settings.
 bool inspectorEnabled();
 bool inspectorCopyBitsToScreen();
+void setInspectorEnabled(bool on);
+void setInspectorCopyBitsToScreen(bool on);
 
 // The two lines notify logs for an exception escaping an event handler. Rethrows the
 // current exception internally; call only from inside a catch block.

@@ -11,6 +11,7 @@
 #include "host/Replaceable.h"
 #include "quickdraw/GrafPortPrivate.h"
 #include "windows/WindowFilters.h"
+#include "windows/WindowPaintOverlay.h"
 #include "windows/WindowPorts.h"
 #include "windows/WindowPrivate.h"
 
@@ -164,6 +165,17 @@ bool minimizeMaximizeChange(AQtWindow* window)
 
 namespace {
 Replaceable<WindowFilterHooks> gFilterHooks;
+Replaceable<PaintOverlayHook> gPaintOverlay;
+}
+
+PaintOverlayHook paintOverlayHook()
+{
+    return gPaintOverlay.get();
+}
+
+PaintOverlayHook SetPaintOverlayHook(PaintOverlayHook hook)
+{
+    return gPaintOverlay.set(hook);
 }
 
 const WindowFilterHooks& windowFilterHooks()

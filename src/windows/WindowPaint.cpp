@@ -7,6 +7,7 @@
 #include "events/EventQueue.h"
 #include "quickdraw/GrafPortPrivate.h"
 #include "quickdraw/PortPainter.h"
+#include "windows/WindowPaintOverlay.h"
 #include "windows/WindowPrivate.h"
 
 #include <QElapsedTimer>
@@ -80,6 +81,12 @@ void AQtWindow::paintEvent(QPaintEvent* e)
         return;
     ScopedFlag inPaint(m_inPaintEvent, true);
 
+    // The overlay shows what this paint was asked to do, so it needs the state from before.
+    const PaintOverlayHook overlay = paintOverlayHook();
+    PaintOverlayInput overlayInput;
+    if (overlay)
+        overlayInput = {m_updateRegion, m_dirtyPortRect};
+
     const QRegion eventRegion = e->region();
     QPainter local;
     QPainter* painter = &local;
@@ -109,6 +116,14 @@ void AQtWindow::paintEvent(QPaintEvent* e)
     }
     if (m_inHighlightState)
         paintHighlightFrame(*painter);
+    if (overlay && painter->isActive()) {
+        painter->save();
+        painter->resetTransform();
+        painter->setClipping(false);
+        painter->setCompositionMode(QPainter::CompositionMode_SourceOver);
+        overlay(this, *painter, overlayInput);
+        painter->restore();
+    }
     notePaint();
 
     if (m_enableDirectQtDrawing) {
