@@ -5,15 +5,10 @@
 #include "events/EventWaiter.h"
 #include "inspector/InspectorRows.h"
 
-#include <QHeaderView>
-#include <QTreeWidget>
-#include <QVBoxLayout>
 
 namespace Velmar::Private::Inspector {
 
 namespace {
-
-enum Column { kObjectColumn = 0, kStateColumn = 1 };
 
 // A host that floods the queue must not flood the tree: beyond this, one row says how many
 // more there are.
@@ -21,44 +16,17 @@ constexpr int kMaxQueueRows = 500;
 
 constexpr const char* kWaiterModes[] = {"plain", "classic", "application"};
 
-void setCount(Row* group, qint64 count)
-{
-    if (group->summary == count)
-        return;
-    group->summary = count;
-    group->setColumn(kStateColumn, QString::number(count));
-}
-
 } // namespace
 
-EventPane::EventPane(QWidget* parent) : QWidget(parent), m_tree(new QTreeWidget(this))
-{
-    m_tree->setObjectName(QStringLiteral("eventTree"));
-    m_tree->setColumnCount(2);
-    m_tree->setHeaderLabels({QStringLiteral("Item"), QStringLiteral("State")});
-    m_tree->setUniformRowHeights(true);
-    m_tree->header()->setSectionResizeMode(kObjectColumn, QHeaderView::ResizeToContents);
-    auto* layout = new QVBoxLayout(this);
-    layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(m_tree);
-}
+EventPane::EventPane(QWidget* parent)
+    : QWidget(parent), m_tree(makeTree(this, QStringLiteral("eventTree"), QStringLiteral("Item")))
+{}
 
 void EventPane::refresh()
 {
     RowSync groups(m_tree->invisibleRootItem());
-    bool changed = false;
-    Row* queue = groups.next(1, RowValues(), &changed);
-    if (changed) {
-        queue->setColumn(kObjectColumn, QStringLiteral("Event queue"));
-        queue->setExpanded(true);
-    }
-    refreshQueue(queue);
-    Row* waiters = groups.next(2, RowValues(), &changed);
-    if (changed) {
-        waiters->setColumn(kObjectColumn, QStringLiteral("Waiters"));
-        waiters->setExpanded(true);
-    }
-    refreshWaiters(waiters);
+    refreshQueue(groupRow(groups, 1, "Event queue"));
+    refreshWaiters(groupRow(groups, 2, "Waiters"));
 }
 
 void EventPane::refreshQueue(Row* group)

@@ -1,5 +1,8 @@
 #include "inspector/InspectorRows.h"
 
+#include <QHeaderView>
+#include <QVBoxLayout>
+
 namespace Velmar::Private::Inspector {
 
 RowSync::~RowSync()
@@ -38,6 +41,39 @@ Row* RowSync::next(quintptr key, const RowValues& values, bool* changed)
         row->formatted = true;
     }
     return row;
+}
+
+QTreeWidget* makeTree(QWidget* pane, const QString& name, const QString& objectHeader)
+{
+    auto* tree = new QTreeWidget(pane);
+    tree->setObjectName(name);
+    tree->setColumnCount(2);
+    tree->setHeaderLabels({objectHeader, QStringLiteral("State")});
+    tree->setUniformRowHeights(true);
+    tree->header()->setSectionResizeMode(kObjectColumn, QHeaderView::ResizeToContents);
+    auto* layout = new QVBoxLayout(pane);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(tree);
+    return tree;
+}
+
+Row* groupRow(RowSync& groups, quintptr key, const char* title)
+{
+    bool changed = false;
+    Row* group = groups.next(key, RowValues(), &changed);
+    if (changed) {
+        group->setColumn(kObjectColumn, QLatin1String(title));
+        group->setExpanded(true);
+    }
+    return group;
+}
+
+void setCount(Row* group, qint64 count)
+{
+    if (group->summary == count)
+        return;
+    group->summary = count;
+    group->setColumn(kStateColumn, QString::number(count));
 }
 
 } // namespace Velmar::Private::Inspector

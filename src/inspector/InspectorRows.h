@@ -4,6 +4,7 @@
 #pragma once
 
 #include <QString>
+#include <QTreeWidget>
 #include <QTreeWidgetItem>
 
 #include <array>
@@ -56,6 +57,18 @@ private:
     QTreeWidgetItem* m_parent;
     int m_index = 0;
 };
+
+// The two columns every inspector tree has.
+enum Column { kObjectColumn = 0, kStateColumn = 1 };
+
+// A two-column tree filling `pane` (its only child), named `name` for tests to find.
+QTreeWidget* makeTree(QWidget* pane, const QString& name, const QString& objectHeader);
+
+// The group row at the next position under `root`, titled and expanded when new.
+Row* groupRow(RowSync& groups, quintptr key, const char* title);
+
+// Shows a group's count in its state column (reformatted only when it changes).
+void setCount(Row* group, qint64 count);
 
 template <typename T>
 quintptr keyOf(const T* object)

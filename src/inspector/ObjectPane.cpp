@@ -10,16 +10,12 @@
 #include "quickdraw/GrafPortPrivate.h"
 #include "windows/WindowPrivate.h"
 
-#include <QHeaderView>
 #include <QMenuBar>
 #include <QTreeWidget>
-#include <QVBoxLayout>
 
 namespace Velmar::Private::Inspector {
 
 namespace {
-
-enum Column { kObjectColumn = 0, kStateColumn = 1 };
 
 // A region as the tree shows it: bounding rectangle and rectangle count.
 struct RegionSummary {
@@ -61,14 +57,6 @@ QString addressText(const void* p)
     return QStringLiteral("0x%1").arg(quintptr(p), 0, 16);
 }
 
-void setCount(Row* group, int count)
-{
-    if (group->summary == count)
-        return;
-    group->summary = count;
-    group->setColumn(kStateColumn, QString::number(count));
-}
-
 RowValues rectValues(const QRect& r, qint64 extra0 = 0, qint64 extra1 = 0, qint64 extra2 = 0)
 {
     RowValues v;
@@ -93,17 +81,10 @@ UInt32 menuChoice(SInt16 menuID, int item)
 
 } // namespace
 
-ObjectPane::ObjectPane(QWidget* parent) : QWidget(parent), m_tree(new QTreeWidget(this))
-{
-    m_tree->setObjectName(QStringLiteral("objectTree"));
-    m_tree->setColumnCount(2);
-    m_tree->setHeaderLabels({QStringLiteral("Object"), QStringLiteral("State")});
-    m_tree->setUniformRowHeights(true);
-    m_tree->header()->setSectionResizeMode(kObjectColumn, QHeaderView::ResizeToContents);
-    auto* layout = new QVBoxLayout(this);
-    layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(m_tree);
-}
+ObjectPane::ObjectPane(QWidget* parent)
+    : QWidget(parent),
+      m_tree(makeTree(this, QStringLiteral("objectTree"), QStringLiteral("Object")))
+{}
 
 void ObjectPane::refresh()
 {
@@ -118,15 +99,8 @@ void ObjectPane::refresh()
     };
     RowSync groups(m_tree->invisibleRootItem());
     quintptr key = 0;
-    for (const GroupRow& g : kGroups) {
-        bool changed = false;
-        Row* group = groups.next(++key, RowValues(), &changed);
-        if (changed) {
-            group->setColumn(kObjectColumn, QLatin1String(g.title));
-            group->setExpanded(true);
-        }
-        (this->*g.refresh)(group);
-    }
+    for (const GroupRow& g : kGroups)
+        (this->*g.refresh)(groupRow(groups, ++key, g.title));
 }
 
 void ObjectPane::refreshWindows(Row* group)

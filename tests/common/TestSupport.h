@@ -154,6 +154,16 @@ private:
     QStringList m_entries;
 };
 
+// A Pascal string of `text` (up to 255 bytes), and the pointer the Toolbox calls take.
+inline QByteArray pascal(const QByteArray& text)
+{
+    return char(text.size()) + text;
+}
+inline const unsigned char* P(const QByteArray& p)
+{
+    return reinterpret_cast<const unsigned char*>(p.constData());
+}
+
 } // namespace VelmarTest
 
 // Fails the test unless what `recorder` saw fits the named expected sequence.

@@ -27,14 +27,8 @@ using namespace Velmar;
 
 namespace {
 
-QByteArray pascal(const QByteArray& text)
-{
-    return char(text.size()) + text;
-}
-const unsigned char* P(const QByteArray& p)
-{
-    return reinterpret_cast<const unsigned char*>(p.constData());
-}
+using VelmarTest::P;
+using VelmarTest::pascal;
 
 constexpr unsigned long kDown = 0xff54, kReturn = 0xff0d, kEscape = 0xff1b, kControl = 0xffe3;
 

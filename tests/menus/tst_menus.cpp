@@ -21,14 +21,8 @@ namespace {
 
 using Asserts = VelmarTest::IgnoredAssertions;
 
-QByteArray pascal(const QByteArray& text)
-{
-    return char(text.size()) + text;
-}
-const unsigned char* P(const QByteArray& p)
-{
-    return reinterpret_cast<const unsigned char*>(p.constData());
-}
+using VelmarTest::P;
+using VelmarTest::pascal;
 
 // A menu made by NewMenu and gone at the end of the scope, whatever the test did with it.
 class Menu {

@@ -3,10 +3,21 @@
 
 #include <QColor>
 #include <QRect>
+#include <QResource>
 
 #include <cstring>
 
 namespace Fixtures {
+
+// Registers the compiled fixture tree; false when it cannot be had.
+inline bool registerTree()
+{
+#ifdef VELMAR_RESOURCE_FIXTURES
+    return QResource::registerResource(QStringLiteral(VELMAR_RESOURCE_FIXTURES));
+#else
+    return false;
+#endif
+}
 
 // Icon family 200 has every member, family 201 only 'icl8', 'icl4' and 'SICN', family 202
 // none. Each member is one flat colour of its own with a transparent corner pixel (so it is

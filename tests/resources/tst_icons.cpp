@@ -80,11 +80,8 @@ class TestIcons : public QObject {
 private Q_SLOTS:
     void initTestCase()
     {
-#ifdef VELMAR_RESOURCE_FIXTURES
-        QVERIFY(QResource::registerResource(QStringLiteral(VELMAR_RESOURCE_FIXTURES)));
-#else
-        QFAIL("no fixture tree: add add_subdirectory(resources) to tests/CMakeLists.txt");
-#endif
+        QVERIFY2(Fixtures::registerTree(),
+                 "no fixture tree: add add_subdirectory(resources) to tests/CMakeLists.txt");
     }
 
     void imagePaths()

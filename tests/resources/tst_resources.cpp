@@ -16,14 +16,8 @@ using namespace Velmar;
 
 namespace {
 
-QByteArray pascal(const QByteArray& text)
-{
-    return char(text.size()) + text;
-}
-const unsigned char* P(const QByteArray& p)
-{
-    return reinterpret_cast<const unsigned char*>(p.constData());
-}
+using VelmarTest::P;
+using VelmarTest::pascal;
 
 // The bytes of an RT_HANDLE handle, checked against the handle's own size.
 QByteArray bytesOf(const ResourceHandle& h)
@@ -40,11 +34,8 @@ class TestResources : public QObject {
 private Q_SLOTS:
     void initTestCase()
     {
-#ifdef VELMAR_RESOURCE_FIXTURES
-        QVERIFY(QResource::registerResource(QStringLiteral(VELMAR_RESOURCE_FIXTURES)));
-#else
-        QFAIL("no fixture tree: add add_subdirectory(resources) to tests/CMakeLists.txt");
-#endif
+        QVERIFY2(Fixtures::registerTree(),
+                 "no fixture tree: add add_subdirectory(resources) to tests/CMakeLists.txt");
     }
 
     // Icon types load icons, 'PICT' pictures, everything else ('icl4' included) the file
