@@ -6,6 +6,8 @@
 #include <Velmar/HostCore.h>
 #include <Velmar/TextUtils.h>
 
+#include "foundation/GuardedCall.h"
+
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPointer>
@@ -13,7 +15,6 @@
 #include <QWheelEvent>
 
 #include <algorithm>
-#include <exception>
 #include <utility>
 
 namespace Velmar {
@@ -105,15 +106,7 @@ struct AQSliderPrivate {
             return;
         const QPointer<AQSlider> alive(slider);
         slider->d->inActionProc = true;
-        try {
-            proc(slider, part);
-        } catch (const XError& error) {
-            LogXError(error);
-        } catch (const std::exception& error) {
-            LogXError(XError("std::exception", error.what()));
-        } catch (...) {
-            LogXError(XError("", "A slider action procedure threw"));
-        }
+        callGuarded([&] { proc(slider, part); }, "A slider action procedure threw");
         if (alive)
             slider->d->inActionProc = false;
     }

@@ -5,6 +5,7 @@
 
 #include "cursors/CursorPrivate.h"
 #include "drag/DragPrivate.h"
+#include "events/KeyModifiers.h"
 #include "foundation/Conversions.h"
 #include "foundation/LiveHandles.h"
 
@@ -30,18 +31,6 @@ bool usableDrag(Drag* drag, bool assertNull)
         return false;
     }
     return VELMAR_LIVE(drag, "IsValidDrag(drag)");
-}
-
-SInt16 toolboxModifiers(UInt32 qt)
-{
-    SInt16 modifiers = 0;
-    if (qt & Qt::ShiftModifier)
-        modifiers |= shiftKey;
-    if (qt & Qt::ControlModifier)
-        modifiers |= cmdKey;
-    if (qt & Qt::AltModifier)
-        modifiers |= optionKey;
-    return modifiers;
 }
 
 } // namespace
@@ -137,8 +126,10 @@ OSErr GetDragModifiers(
         *modifiers = SInt16(GetCurrentKeyModifiers());
     if (mouseDownModifiers)
         *mouseDownModifiers = 0;
+    // Meta has no part in a drop's modifiers.
+    const auto dropped = Qt::KeyboardModifiers(drag->dropModifiers()) & ~Qt::MetaModifier;
     if (mouseUpModifiers)
-        *mouseUpModifiers = toolboxModifiers(drag->dropModifiers());
+        *mouseUpModifiers = SInt16(macModifiers(dropped));
     return noErr;
 }
 
@@ -157,7 +148,7 @@ OSErr GetDragAttributes(Drag* drag, DragAttributes* flags)
     if (!usableDrag(drag, false))
         return badDragRefErr;
     if (flags)
-        *flags = drag->isTracking() ? kDragInsideSenderApplication : 0;
+        *flags = drag->isTracking() ? DragAttributes(kDragInsideSenderApplication) : 0;
     return noErr;
 }
 

@@ -6,11 +6,11 @@
 #include <Velmar/Windows.h>
 
 #include "drag/DragPrivate.h"
+#include "foundation/GuardedCall.h"
 #include "windows/WindowFilters.h"
 
 #include <QDropEvent>
 
-#include <exception>
 
 namespace Velmar {
 
@@ -50,18 +50,11 @@ void forgetTarget()
         drag->clearTarget();
 }
 
+// A handler that throws ends the dispatch and the drag's target with it.
 template <typename Call> bool guarded(Call call)
 {
-    try {
-        call();
+    if (callGuarded(call, "A drag handler threw"))
         return true;
-    } catch (const XError& error) {
-        LogXError(error);
-    } catch (const std::exception& error) {
-        LogXError(XError("std::exception", error.what()));
-    } catch (...) {
-        LogXError(XError("", "A drag handler threw"));
-    }
     forgetTarget();
     return false;
 }

@@ -1,6 +1,7 @@
 // The keyboard's modifier state as Mac modifier bits.
 #include <Velmar/Events.h>
 
+#include "events/KeyModifiers.h"
 #include "platform/Platform.h"
 
 #include <QGuiApplication>
@@ -24,14 +25,19 @@ const ModifierRow kModifierRows[] = {
 
 } // namespace
 
-UInt32 GetCurrentKeyModifiers()
+UInt32 Private::macModifiers(Qt::KeyboardModifiers qt)
 {
-    const Qt::KeyboardModifiers qt = QGuiApplication::keyboardModifiers();
     UInt32 mac = 0;
     for (const ModifierRow& row : kModifierRows) {
         if (qt.testFlag(row.qt))
             mac |= row.mac;
     }
+    return mac;
+}
+
+UInt32 GetCurrentKeyModifiers()
+{
+    UInt32 mac = Private::macModifiers(QGuiApplication::keyboardModifiers());
     if (Private::Platform::isCapsLockToggled())
         mac |= alphaLock;
     return mac;

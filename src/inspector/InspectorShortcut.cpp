@@ -33,9 +33,7 @@ bool onSpecialEvent(AQtWindow*, QEvent* e)
 void installInspectorShortcut()
 {
     WindowFilterHooks hooks = windowFilterHooks();
-    if (hooks.specialEvent == onSpecialEvent)
-        return;
-    if (hooks.specialEvent) // a host's own filter stays
+    if (hooks.specialEvent) // ours already, or a host's own, which stays
         return;
     hooks.specialEvent = onSpecialEvent;
     SetWindowFilterHooks(hooks);

@@ -27,7 +27,6 @@ InspectorWindow::InspectorWindow()
     setWindowTitle(QStringLiteral("Velmar inspector"));
     // A tool window of its own: never one of the host's windows, never in its window list.
     setWindowFlag(Qt::Tool);
-    setAttribute(Qt::WA_DeleteOnClose, false);
     m_tabs->addTab(m_objects, QStringLiteral("Objects"));
     m_tabs->addTab(m_events, QStringLiteral("Events"));
     m_tabs->addTab(m_log, m_log->windowTitle());

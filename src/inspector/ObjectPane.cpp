@@ -188,9 +188,7 @@ void ObjectPane::refreshOffscreenPorts(Row* group)
 void ObjectPane::refreshMenus(Row* group)
 {
     RowSync rows(group);
-    AQtApplication* app = AQtApplication::instance();
-    QMenuBar* bar = app ? app->menuBar() : nullptr;
-    if (bar) {
+    if (QMenuBar* bar = applicationMenuBar()) {
         for (QAction* barAction : bar->actions()) {
             QMenu* menu = barAction->menu();
             if (!isLive(menu))

@@ -16,6 +16,15 @@ namespace {
 
 void place(QWidget* window);
 
+// Takes the bar out of the host's window it was shown in.
+void detachMenuBar()
+{
+    if (QMenuBar* bar = applicationMenuBar(); bar && bar->parentWidget()) {
+        bar->hide();
+        bar->setParent(nullptr);
+    }
+}
+
 // Keeps the bar inside the host's window only while that window shows, so that closing or
 // deleting the window never takes the application's menu bar with it.
 class WindowWatcher : public QObject {
@@ -27,17 +36,9 @@ public:
         if (event->type() == QEvent::Show) {
             place(window);
         } else if (event->type() == QEvent::Hide) {
-            if (QMenuBar* bar = menuBar(); bar && bar->parentWidget()) {
-                bar->hide();
-                bar->setParent(nullptr);
-            }
+            detachMenuBar();
         }
         return false;
-    }
-    static QMenuBar* menuBar()
-    {
-        AQtApplication* app = AQtApplication::instance();
-        return app ? app->menuBar() : nullptr;
     }
     QPointer<QWidget> window;
 };
@@ -50,7 +51,7 @@ Placement gPlacement;
 
 void place(QWidget* window)
 {
-    QMenuBar* bar = WindowWatcher::menuBar();
+    QMenuBar* bar = applicationMenuBar();
     Brindle::DecorationManager* shell = Brindle::DecorationManager::Instance();
     if (!bar || !shell)
         return;
@@ -84,10 +85,8 @@ void SetMenuBarWindow(QWidget* window)
     watcher->window = window;
     if (window)
         window->installEventFilter(watcher);
-    if (QMenuBar* bar = WindowWatcher::menuBar(); bar && !window && bar->parentWidget()) {
-        bar->hide();
-        bar->setParent(nullptr);
-    }
+    if (!window)
+        detachMenuBar();
     place(window);
 }
 

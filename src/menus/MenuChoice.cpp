@@ -84,24 +84,18 @@ SInt32 MenuSelect(Point)
 
 SInt32 MenuKey(SInt16 ch)
 {
-    return FindEnabledItemByShortcut(
-        QKeySequence(QStringLiteral("Ctrl+%1").arg(QChar::fromLatin1(char(ch)))));
+    return FindEnabledItemByShortcut(commandShortcut(true, false, false, char(ch)));
 }
 
 UInt32 MenuEvent(const EventRecord* event)
 {
     if (!event || event->what != keyDown)
         return 0;
-    // The command key is Control here; the Mac's control key has no part in shortcuts.
-    QString text;
-    if (event->modifiers & cmdKey)
-        text += QStringLiteral("Ctrl+");
-    if (event->modifiers & (optionKey | rightOptionKey))
-        text += QStringLiteral("Alt+");
-    if (event->modifiers & (shiftKey | rightShiftKey))
-        text += QStringLiteral("Shift+");
-    text += QChar::fromLatin1(char(event->message & charCodeMask));
-    return UInt32(FindEnabledItemByShortcut(QKeySequence(text)));
+    // The Mac's control key has no part in shortcuts.
+    const UInt16 m = event->modifiers;
+    return UInt32(FindEnabledItemByShortcut(
+        commandShortcut(m & cmdKey, m & (optionKey | rightOptionKey), m & (shiftKey | rightShiftKey),
+                        char(event->message & charCodeMask))));
 }
 
 } // namespace Velmar

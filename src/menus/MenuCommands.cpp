@@ -40,16 +40,22 @@ void UpdateShortcut(MenuRef menu, UInt16 item)
     UInt8 modifiers = 0;
     const OSErr err = GetMenuItemModifiers(menu, item, &modifiers);
     VELMAR_ASSERT(err == noErr, "noErr == err");
-    // The Mac's command key is the Control key here.
+    action->setShortcut(commandShortcut(!(modifiers & kMenuNoCommandModifier),
+                                        modifiers & kMenuOptionModifier,
+                                        modifiers & kMenuShiftModifier, char(cmd)));
+}
+
+QKeySequence commandShortcut(bool command, bool option, bool shift, char key)
+{
     QString text;
-    if (!(modifiers & kMenuNoCommandModifier))
+    if (command)
         text += QStringLiteral("Ctrl+");
-    if (modifiers & kMenuShiftModifier)
-        text += QStringLiteral("Shift+");
-    if (modifiers & kMenuOptionModifier)
+    if (option)
         text += QStringLiteral("Alt+");
-    text += QChar::fromLatin1(char(cmd));
-    action->setShortcut(QKeySequence(text));
+    if (shift)
+        text += QStringLiteral("Shift+");
+    text += QChar::fromLatin1(key);
+    return QKeySequence(text);
 }
 
 } // namespace Private

@@ -13,12 +13,6 @@ using namespace Private;
 
 namespace {
 
-QMenuBar* applicationMenuBar()
-{
-    AQtApplication* app = AQtApplication::instance();
-    return app ? app->menuBar() : nullptr;
-}
-
 // The ID a menu carries, without the list check (for menus known to be alive).
 SInt16 carriedId(const QMenu* menu)
 {
@@ -37,6 +31,12 @@ MenuRef newMenu(SInt16 menuID, const QString& title)
 } // namespace
 
 namespace Private {
+
+QMenuBar* applicationMenuBar()
+{
+    AQtApplication* app = AQtApplication::instance();
+    return app ? app->menuBar() : nullptr;
+}
 
 void InsertMenuToMenuBar(MenuRef menu, SInt16 beforeID)
 {

@@ -8,6 +8,7 @@
 
 #include <QAction>
 #include <QMenu>
+#include <QMenuBar>
 
 #include <map>
 #include <stdexcept>
@@ -70,6 +71,10 @@ void CheckMenuItem(QAction* action, bool checked);
 void UpdateShortcut(MenuRef menu, UInt16 item);
 SInt32 CalculateMenuSelectInfo(QAction* action);
 SInt32 FindEnabledItemByShortcut(const QKeySequence& sequence);
+// A command key as a shortcut: the Mac's command key is the Control key here, option is Alt.
+QKeySequence commandShortcut(bool command, bool option, bool shift, char key);
+// The application's menu bar; null without an application.
+QMenuBar* applicationMenuBar();
 bool NeedsListPopup(const QPoint& point, QMenu* menu);
 void ApplyMenuFont(QMenu* menu);
 void RelinkSubmenus(QMenu* menu);

@@ -7,6 +7,21 @@ namespace Velmar {
 
 using namespace Private;
 
+namespace {
+
+void copyThroughMask(const char* call, BitMapView src, BitMapView mask, BitMapView dst,
+                     const Rect* srcRect, const Rect* maskRect, const Rect* dstRect, SInt16 mode,
+                     RgnHandle maskRgn)
+{
+    CopyJob job{call, src, dst, srcRect, dstRect, mode, maskRgn};
+    job.hasMask = true;
+    job.mask = mask;
+    job.maskRect = maskRect;
+    runCopy(job);
+}
+
+} // namespace
+
 void CopyBits(BitMapView src, BitMapView dst, const Rect* srcRect, const Rect* dstRect,
               SInt16 mode, RgnHandle maskRgn)
 {
@@ -32,21 +47,13 @@ void CopyOneField(BitMapView src, BitMapView dst, const Rect* srcRect, const Rec
 void CopyDeepMask(BitMapView src, BitMapView mask, BitMapView dst, const Rect* srcRect,
                   const Rect* maskRect, const Rect* dstRect, SInt16 mode, RgnHandle maskRgn)
 {
-    CopyJob job{"CopyDeepMask", src, dst, srcRect, dstRect, mode, maskRgn};
-    job.hasMask = true;
-    job.mask = mask;
-    job.maskRect = maskRect;
-    runCopy(job);
+    copyThroughMask("CopyDeepMask", src, mask, dst, srcRect, maskRect, dstRect, mode, maskRgn);
 }
 
 void CopyMask(BitMapView src, BitMapView mask, BitMapView dst, const Rect* srcRect,
               const Rect* maskRect, const Rect* dstRect)
 {
-    CopyJob job{"CopyMask", src, dst, srcRect, dstRect, srcCopy, nullptr};
-    job.hasMask = true;
-    job.mask = mask;
-    job.maskRect = maskRect;
-    runCopy(job);
+    copyThroughMask("CopyMask", src, mask, dst, srcRect, maskRect, dstRect, srcCopy, nullptr);
 }
 
 } // namespace Velmar

@@ -144,10 +144,13 @@ QRegion clipFor(const QRect& area, const PixelMap& dst, RgnHandle maskRgn, bool*
 }
 
 // A destination with no word pixels (a one-bit map, or a direct-drawing window) is
-// worked on in a 32-bit stand-in and given the result afterwards.
+// worked on in a 32-bit stand-in and given the result afterwards. The destination's own
+// pixels (null for a window) and where they lie are kept to write back to.
 struct StandIn {
     bool used = false;
-    PixelMap saved;
+    QImage pixels;
+    QImage* target = nullptr;
+    QPoint targetOrigin;
 };
 
 bool useStandIn(PixelMap& dst, const QRect& area, const TransferInk& ink, StandIn* standIn,
@@ -162,20 +165,18 @@ bool useStandIn(PixelMap& dst, const QRect& area, const TransferInk& ink, StandI
         return false;
     }
     standIn->used = true;
-    standIn->saved = dst;
-    // A wrapped map points at its own member: the saved copy must point at its own.
-    if (dst.image == &dst.wrapped)
-        standIn->saved.image = &standIn->saved.wrapped;
+    standIn->target = dst.image;
+    standIn->targetOrigin = dst.origin;
     if (dst.image) {
-        dst.wrapped = dst.image->copy(QRect(dst.toImage(area.topLeft()), area.size()))
-                          .convertToFormat(QImage::Format_ARGB32_Premultiplied);
+        standIn->pixels = dst.image->copy(QRect(dst.toImage(area.topLeft()), area.size()))
+                              .convertToFormat(QImage::Format_ARGB32_Premultiplied);
     } else {
         // What a direct-drawing window shows cannot be read back: the modes combine with
         // the back colour instead.
-        dst.wrapped = QImage(area.size(), QImage::Format_ARGB32_Premultiplied);
-        dst.wrapped.fill(ink.back);
+        standIn->pixels = QImage(area.size(), QImage::Format_ARGB32_Premultiplied);
+        standIn->pixels.fill(ink.back);
     }
-    dst.image = &dst.wrapped;
+    dst.image = &standIn->pixels;
     dst.origin = area.topLeft();
     return true;
 }
@@ -183,19 +184,17 @@ bool useStandIn(PixelMap& dst, const QRect& area, const TransferInk& ink, StandI
 void finishStandIn(const StandIn& standIn, const PixelMap& work, const QRegion& written,
                    const char* call)
 {
-    const PixelMap& dst = standIn.saved;
-    if (dst.image) {
+    if (QImage* target = standIn.target) {
         // One bit per pixel: dark pixels set the bit (index 1 is black).
         for (const QRect& r : written)
             for (int y = r.top(); y <= r.bottom(); ++y)
                 for (int x = r.left(); x <= r.right(); ++x) {
-                    const QPoint at = dst.toImage(QPoint(x, y));
                     const QRgb c = work.image->pixel(work.toImage(QPoint(x, y)));
-                    dst.image->setPixel(at, qGray(c) < 128 ? 1u : 0u);
+                    target->setPixel(QPoint(x, y) - standIn.targetOrigin, qGray(c) < 128 ? 1u : 0u);
                 }
         return;
     }
-    MakeQPainter painter(dst.port, call);
+    MakeQPainter painter(work.port, call);
     if (!painter)
         return;
     painter->save();
@@ -279,33 +278,17 @@ void runCopy(const CopyJob& job)
             transfer(in, work.data(), count, ink);
             const QRgb* weights = sourceRow(mask, *maskPlane, maskPlane->y.at(row),
                                             column, count, maskBuffer);
-            for (int i = 0; i < count; ++i) {
-                // Each component takes the copied value in proportion to the mask's darkness.
-                QRgb mixed = 0xFF000000u;
-                for (int shift = 0; shift <= 16; shift += 8) {
-                    const int m = int((weights[i] >> shift) & 0xFF);
-                    const int d = int((out[i] >> shift) & 0xFF);
-                    const int c = int((work[std::size_t(i)] >> shift) & 0xFF);
-                    mixed |= QRgb((c * (255 - m) + d * m + 127) / 255) << shift;
-                }
-                out[i] = mixed;
-            }
+            maskRow(work.data(), weights, out, count);
         }
     };
-    if (simple) {
-        copyRect(area);
-    } else {
-        for (const QRect& r : clip)
-            copyRect(r);
-    }
-
     const QRegion written = simple ? QRegion(area) : clip;
-    if (standIn.used) {
+    for (const QRect& r : written)
+        copyRect(r);
+
+    if (standIn.used)
         finishStandIn(standIn, dst, written, call);
-        dst = standIn.saved;
-    } else if (dst.port) {
+    else if (dst.port)
         dst.port->markDirty(area);
-    }
     if (dst.port && dst.port->window && (job.toScreen || inspectorCopyBitsToScreen()))
         QDFlushPortBuffer(dst.port, nullptr);
 }

@@ -14,7 +14,7 @@ struct PixelMap {
     QPoint origin;
     QtGrafPort* port = nullptr;
     PixMapPtr* pixmap = nullptr;
-    QImage wrapped; // a hand-made BitMap's memory, seen as an image (no copy)
+    QImage wrapped; // pixels the map holds itself: a BitMap's memory seen in place, or a detached copy
 
     QRect localRect() const { return image ? QRect(origin, image->size()) : QRect(); }
     QPoint toImage(const QPoint& local) const { return local - origin; }

@@ -113,13 +113,6 @@ void drawAtPen(const TextRun& run)
     port->penX = clampFar(x + width);
 }
 
-QString bytesText(const void* text, SInt16 first, SInt16 count)
-{
-    if (!text || count <= 0)
-        return QString();
-    return MakeQString(static_cast<const char*>(text) + first, count);
-}
-
 bool opaqueTextMode()
 {
     const QtGrafPort* port = currentGrafPort();
@@ -130,15 +123,6 @@ bool opaqueTextMode()
 void drawBytes(const QString& text, TextScale scale = {}, qreal extraPerSpace = 0)
 {
     drawAtPen({text, !opaqueTextMode(), scale, extraPerSpace});
-}
-
-bool validUtf16Range(SInt16 first, SInt16 count, const char* call)
-{
-    if (first >= 0 && count >= 0)
-        return true;
-    VelmarLog(
-        kLogQuickDraw, "warning: Velmar::%s: first %d or count %d is negative", call, first, count);
-    return false;
 }
 
 } // namespace
@@ -159,9 +143,7 @@ void DrawString(const unsigned char* s)
 
 void DrawChar(SInt16 ch)
 {
-    const char bytes[2] = {char(UInt16(ch) >> 8), char(ch)};
-    // A value above 255 is a two-byte character, high byte first.
-    drawBytes(UInt16(ch) > 0xFF ? MakeQString(bytes, 2) : MakeQString(bytes + 1, 1));
+    drawBytes(charText(ch));
 }
 
 void StdText(SInt16 count, const void* text, Point numer, Point denom)
@@ -171,13 +153,13 @@ void StdText(SInt16 count, const void* text, Point numer, Point denom)
 
 void DrawTextUTF16(bool transparent, const QString& text, SInt16 first, SInt16 count)
 {
-    if (validUtf16Range(first, count, "DrawTextUTF16"))
+    if (validRange(first, count, "Velmar::DrawTextUTF16"))
         drawAtPen({text.mid(first, count), transparent, {}});
 }
 
 void DrawTextBufUTF16(bool transparent, const unsigned short* text, SInt16 first, SInt16 count)
 {
-    if (validUtf16Range(first, count, "DrawTextBufUTF16"))
+    if (validRange(first, count, "Velmar::DrawTextBufUTF16"))
         drawAtPen({text ? boundedUtf16(text, first, count) : QString(), transparent, {}});
 }
 

@@ -33,14 +33,6 @@ SInt16 portWidth(const QString& text)
     return toWidth(portFontEntry(port).width(text));
 }
 
-bool validRange(int first, int count, const char* call)
-{
-    if (first >= 0 && count >= 0)
-        return true;
-    VelmarLog(kLogQuickDraw, "warning: %s: first %d or count %d is negative", call, first, count);
-    return false;
-}
-
 // The number of bytes each character of `text` takes in the current Macintosh encoding.
 std::vector<int> encodedLengths(const QString& text)
 {
@@ -104,15 +96,12 @@ SInt16 TextWidth(const void* text, SInt16 first, SInt16 count)
 {
     if (!text || !validRange(first, count, "TextWidth") || count == 0)
         return 0;
-    return portWidth(MakeQString(static_cast<const char*>(text) + first, count));
+    return portWidth(bytesText(text, first, count));
 }
 
 SInt16 CharWidth(SInt16 ch)
 {
-    const char bytes[2] = {char(UInt16(ch) >> 8), char(ch)};
-    // A value above 255 is a two-byte character, high byte first.
-    return UInt16(ch) > 0xFF ? portWidth(MakeQString(bytes, 2))
-                             : portWidth(MakeQString(bytes + 1, 1));
+    return portWidth(charText(ch));
 }
 
 SInt16 TextWidthUTF16(const QString& text, int first, int count)

@@ -147,6 +147,17 @@ constexpr ModeEntry kModes[] = {
 
 } // namespace
 
+void maskRow(const QRgb* copied, const QRgb* mask, QRgb* dst, int count)
+{
+    for (int i = 0; i < count; ++i) {
+        const QRgb c = copied[i], m = mask[i], d = dst[i];
+        const auto at = [&](int shift) {
+            return QRgb(mix(channel(c, shift), channel(d, shift), channel(m, shift))) << shift;
+        };
+        dst[i] = kOpaque | at(16) | at(8) | at(0);
+    }
+}
+
 RowTransfer rowTransferFor(SInt16 mode, const char* call)
 {
     const SInt16 plain = SInt16(mode & ~ditherCopy);

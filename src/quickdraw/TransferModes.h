@@ -23,6 +23,9 @@ using RowTransfer = void (*)(const QRgb* src, QRgb* dst, int count, const Transf
 // The row function for `mode` (ditherCopy ignored). A mode the library does not know is
 // logged in the NotImpl category under `call` and copies as srcCopy.
 RowTransfer rowTransferFor(SInt16 mode, const char* call);
+// Lays `copied` over the destination words, each component in proportion to how dark the
+// mask's component is (black: all of it, white: none).
+void maskRow(const QRgb* copied, const QRgb* mask, QRgb* dst, int count);
 // srcCopy without tinting: the words, made opaque.
 void copyRowOpaque(const QRgb* src, QRgb* dst, int count, const TransferInk&);
 

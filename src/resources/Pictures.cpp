@@ -13,19 +13,6 @@ namespace Velmar {
 
 using namespace Private;
 
-namespace {
-
-// Stands in for an image that cannot be shown. Only a non-null image that failed to show
-// would get its text, so a missing picture stays blank.
-void drawPlaceholder(QPainter* painter, const QRect& target, const QString& text, bool isNull)
-{
-    if (isNull)
-        return;
-    painter->drawText(target, Qt::AlignCenter, text);
-}
-
-} // namespace
-
 namespace Private {
 
 QImage* newPicture(const QImage& image)
@@ -71,9 +58,8 @@ void DrawPicture(ResourceHandle picture, const Rect* rect)
     if (!painter)
         return;
     const QRect target = toQRect(rect);
-    if (!image || image->isNull())
-        drawPlaceholder(painter, target, QStringLiteral("image"), true);
-    else {
+    // A missing picture stays blank.
+    if (image && !image->isNull()) {
         // Pictures keep their own transparency whatever the pen mode.
         const QPainter::CompositionMode mode = painter->compositionMode();
         painter->setCompositionMode(QPainter::CompositionMode_SourceOver);

@@ -161,8 +161,6 @@ void TEActivateEx(TEPtr* te, WindowRef focusWindow)
         return;
     if (!VELMAR_ASSERT(focusWindow != nullptr, "focusWindow != NULL"))
         focusWindow = recordWindow(te);
-    TEPtrPrivate* d = teData(te);
-    d->active = true;
     te->SetFocusWindowOnActivate(focusWindow);
     CommonTextEditAPI* editor = editorOf(te, "TEActivateEx");
     if (!editor)
@@ -177,7 +175,6 @@ void TEDeactivate(TEPtr* te, Boolean)
 {
     if (!VELMAR_CHECK_TE(te))
         return;
-    teData(te)->active = false;
     CommonTextEditAPI* editor = te->Qt();
     if (!editor)
         return;

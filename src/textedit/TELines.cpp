@@ -60,10 +60,12 @@ const SInt16* TEPtr::lineStarts() const
 {
     std::vector<SInt16>& starts = m_d->lineStarts;
     starts.clear();
+    // One copy of the text for every offset: counting bytes reads it once per line.
+    const QString text = recordText(this);
     if (m_editor)
         for (const LineInfo& line : layoutLines(m_editor))
-            starts.push_back(clamp16(hostOffset(this, line.start)));
-    starts.push_back(clamp16(teLengthEx()));
+            starts.push_back(clamp16(hostOffset(this, text, line.start)));
+    starts.push_back(clamp16(hostOffset(this, text, int(text.size()))));
     return starts.data();
 }
 

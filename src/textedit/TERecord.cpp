@@ -132,16 +132,12 @@ QPalette recordPalette(const TEPtr* te, const QPalette& base)
         haveSkin = haveSkin && manager
             && manager->GetTxRGBColorBasedOnHighlightIndex(QString::fromLatin1(kKeys[i]), skin[i]);
     if (haveSkin) {
-        const auto colour = [](const RGBColor& c) {
-            return QColor::fromRgbF(
-                float(c.red / 65535.0), float(c.green / 65535.0), float(c.blue / 65535.0));
-        };
-        palette.setBrush(QPalette::All, QPalette::Highlight, colour(skin[0]));
-        palette.setBrush(QPalette::All, QPalette::HighlightedText, colour(skin[1]));
-        palette.setColor(QPalette::Active, QPalette::Base, colour(skin[2]));
-        palette.setColor(QPalette::Active, QPalette::Text, colour(skin[3]));
-        palette.setColor(QPalette::Inactive, QPalette::Base, colour(skin[4]));
-        palette.setColor(QPalette::Inactive, QPalette::Text, colour(skin[5]));
+        palette.setBrush(QPalette::All, QPalette::Highlight, toQColor(skin[0]));
+        palette.setBrush(QPalette::All, QPalette::HighlightedText, toQColor(skin[1]));
+        palette.setColor(QPalette::Active, QPalette::Base, toQColor(skin[2]));
+        palette.setColor(QPalette::Active, QPalette::Text, toQColor(skin[3]));
+        palette.setColor(QPalette::Inactive, QPalette::Base, toQColor(skin[4]));
+        palette.setColor(QPalette::Inactive, QPalette::Text, toQColor(skin[5]));
     }
     for (auto it = d->paletteColours.cbegin(); it != d->paletteColours.cend(); ++it)
         palette.setColor(QPalette::ColorRole(it.key()), it.value());
@@ -208,9 +204,10 @@ TEPtr::TEPtr(const Rect* dest, const Rect* view, bool styled) : m_d(new TEPtrPri
         m_d->txFace = GetPortTextFace(port);
     }
     const Rect none{0, 0, 0, 0};
-    setViewRect(view ? *view : none);
-    setDestRect(dest ? *dest : none);
-    setClipRect(view ? *view : none);
+    m_d->view = view ? *view : none;
+    m_d->dest = dest ? *dest : none;
+    m_d->clip = m_d->view;
+    applyGeometry(this); // once, with all three in place
     m_editor->fullRepaint();
     if (parent) {
         m_clip->show();
@@ -375,12 +372,7 @@ void TEPtr::setJust(SInt16 just)
     m_d->just = just;
     if (!m_editor)
         return;
-    Qt::Alignment alignment = Qt::AlignLeft;
-    if (just == teCenter)
-        alignment = Qt::AlignHCenter;
-    else if (just == teFlushRight)
-        alignment = Qt::AlignRight;
-    m_editor->setAlignment(alignment);
+    m_editor->setAlignment(alignmentForJust(just));
 }
 
 SInt16 TEPtr::crOnly() const

@@ -36,14 +36,13 @@ struct TEPtrPrivate {
     bool noWrap = false;
     bool allowMultipleBlocks = true;
     bool autoView = true;
-    bool active = false;
     unsigned short mask = 0;
     QString maskedText; // the real text while characters are masked
     bool maskingEdit = false;
     Handle hText = nullptr; // the text handle TEGetText hands out
     std::vector<SInt16> lineStarts;
     TEClickLoopUPP clickLoop = nullptr;
-    WindowRef focusWindow;
+    WindowRef focusWindow = nullptr;
     QString orphanText; // the text when the editor went with its window
     QTextCursor editBlock;
     int editBlockDepth = 0;
@@ -72,6 +71,14 @@ QString editorToHostText(const QString& text);
 // Bytes of the host's encoding (up to an embedded NUL) as editor text.
 QString editorTextFromBytes(const void* bytes, SInt32 length);
 
+// The horizontal alignment a justification asks for.
+inline Qt::Alignment alignmentForJust(SInt16 just)
+{
+    if (just == teCenter)
+        return Qt::AlignHCenter;
+    return just == teFlushRight ? Qt::AlignRight : Qt::AlignLeft;
+}
+
 // The editor's text ('\n' between lines), or the kept text when the editor is gone.
 QString recordText(const TEPtr* te);
 
@@ -79,6 +86,8 @@ QString recordText(const TEPtr* te);
 // positions.
 int editorPosition(const TEPtr* te, SInt32 offset);
 SInt32 hostOffset(const TEPtr* te, int position);
+// The same for `text`, the record's text already in hand (many offsets of one text).
+SInt32 hostOffset(const TEPtr* te, const QString& text, int position);
 
 // Local (port) coordinates and the editor's viewport coordinates.
 QPoint localToViewport(const TEPtr* te, Point local);

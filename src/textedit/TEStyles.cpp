@@ -19,11 +19,6 @@ using namespace Private;
 
 namespace {
 
-QColor toColour(const RGBColor& c)
-{
-    return toQColor(c);
-}
-
 // A style as a character format; `mode` says which parts are set.
 QTextCharFormat formatOf(SInt16 mode, const TextStyle& style, const QFont& current)
 {
@@ -44,7 +39,7 @@ QTextCharFormat formatOf(SInt16 mode, const TextStyle& style, const QFont& curre
         format.setFontPointSize(std::max<qreal>(0.75, points + style.tsSize * 0.75));
     }
     if (mode & doColor)
-        format.setForeground(toColour(style.tsColor));
+        format.setForeground(toQColor(style.tsColor));
     return format;
 }
 

@@ -85,6 +85,11 @@ SInt32 hostOffset(const TEPtr* te, int position)
     return encodedLength(recordText(te), position);
 }
 
+SInt32 hostOffset(const TEPtr* te, const QString& text, int position)
+{
+    return te->UseLocal8Bit() ? encodedLength(text, position) : position;
+}
+
 void insertEditorText(TEPtr* te, const QString& text)
 {
     CommonTextEditAPI* editor = te->Qt();
@@ -128,9 +133,8 @@ void TEPtr::setText(const void* text, SInt32 length)
 
 void TEPtr::setTextUTF16(const unsigned short* text)
 {
-    const QString converted = text
-        ? hostToEditorText(QString::fromUtf16(reinterpret_cast<const char16_t*>(text)))
-        : QString();
+    const QString converted =
+        text ? QString::fromUtf16(reinterpret_cast<const char16_t*>(text)) : QString();
     const QByteArray bytes = MakeLocal8Bit(editorToHostText(converted));
     setText(bytes.constData(), SInt32(bytes.size() - 1));
 }
@@ -175,7 +179,7 @@ SInt32 TEPtr::getUTF16BufSizeNeeded() const
 SInt32 TEPtr::teLengthEx() const
 {
     const QString text = recordText(this);
-    return hostOffset(this, int(text.size()));
+    return hostOffset(this, text, int(text.size()));
 }
 
 SInt16 TEPtr::teLength() const

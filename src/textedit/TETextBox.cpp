@@ -5,6 +5,7 @@
 
 #include "foundation/Conversions.h"
 #include "quickdraw/ShapeLog.h"
+#include "textedit/TERecordPrivate.h"
 
 #include <QRegularExpression>
 
@@ -24,13 +25,8 @@ void TETextBox(const void* text, SInt32 length, const Rect* box, SInt16 just)
     static const QRegularExpression sBreaks(QStringLiteral("\r\n|\n\r|\r"));
     QString lines = MakeQString(static_cast<const char*>(text), length);
     lines.replace(sBreaks, QStringLiteral("\n"));
-    int alignment = Qt::AlignLeft;
-    if (just == teCenter)
-        alignment = Qt::AlignHCenter;
-    else if (just == teFlushRight)
-        alignment = Qt::AlignRight;
     const QRect area = box ? toQRect(*box) : QRect();
-    painter->drawText(area, alignment | Qt::AlignTop | Qt::TextWordWrap, lines);
+    painter->drawText(area, int(alignmentForJust(just) | Qt::AlignTop | Qt::TextWordWrap), lines);
     painter |= area;
 }
 

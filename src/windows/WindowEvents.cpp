@@ -6,6 +6,8 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "events/EventQueue.h"
+#include "foundation/GuardedCall.h"
+#include "events/KeyModifiers.h"
 #include "events/QtInputConversion.h"
 #include "windows/WindowFilters.h"
 #include "windows/WindowPorts.h"
@@ -42,16 +44,8 @@ void schedule(AQtWindow* window, UInt32 eventClass, UInt32 eventKind, const QRec
 template <typename Call>
 void guarded(Call call)
 {
-    try {
-        call();
-    } catch (const XError& error) {
-        LogXError(error);
-    } catch (const std::exception& error) {
-        LogXError(XError("std::exception", error.what()));
-    } catch (...) {
-        LogXError(XError("", "A serious error has occurred!\nIt is recommended that you restart "
-                             "the application immediately."));
-    }
+    callGuarded(call, "A serious error has occurred!\nIt is recommended that you restart "
+                      "the application immediately.");
 }
 
 } // namespace
@@ -195,14 +189,7 @@ bool AQtWindow::AcceptDropOnWindowTab(Qt::KeyboardModifiers modifiers)
 {
     if (!m_enableEventHandling || !m_eventHandler)
         return false;
-    SInt16 mac = 0;
-    if (modifiers & Qt::ShiftModifier)
-        mac |= shiftKey;
-    if (modifiers & Qt::AltModifier)
-        mac |= optionKey;
-    if (modifiers & (Qt::ControlModifier | Qt::MetaModifier))
-        mac |= cmdKey;
-    return m_eventHandler->DropOnWindowTabHandler(mac);
+    return m_eventHandler->DropOnWindowTabHandler(SInt16(macModifiers(modifiers)));
 }
 
 void AQtWindow::SetContentSize(const QSize& size)
