@@ -6,7 +6,7 @@
 #include <Velmar/HostCore.h>
 #include <Velmar/TextUtils.h>
 
-#include "foundation/GuardedCall.h"
+#include "foundation/Lifetime.h"
 
 #include <QKeyEvent>
 #include <QMouseEvent>

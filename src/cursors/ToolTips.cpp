@@ -55,7 +55,7 @@ void HideToolTip(bool destroy)
     for (QWidget* widget : QApplication::topLevelWidgets()) {
         if (qstrcmp(widget->metaObject()->className(), "QTipLabel") == 0) {
             widget->close();
-            widget->deleteLater();
+            deleteWhenFree(widget);
         }
     }
 }

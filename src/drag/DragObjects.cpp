@@ -2,6 +2,7 @@
 #include <Velmar/Drag.h>
 
 #include "drag/DragPrivate.h"
+#include "foundation/Lifetime.h"
 #include "foundation/LiveHandles.h"
 
 #include <QTimerEvent>
@@ -47,6 +48,9 @@ QVariant MimeData::retrieveData(const QString& mimeType, QMetaType type) const
 {
     if (mimeType == kUriList) {
         auto* self = const_cast<MimeData*>(this);
+        // The exporter is host code: it may dispose of the drag, and so of this data.
+        KeepAlive keep(self);
+        HostCallScope hostCode;
         if (!m_exported && droppedOutside(m_phase)) {
             m_exported = true;
             Q_EMIT self->runExport(self);
@@ -126,9 +130,9 @@ OSErr DisposeDrag(Drag* drag)
     if (!VELMAR_ASSERT(drag && drag == DragInstance(), "theDrag == DragInstance()"))
         return noErr;
     instance() = nullptr;
-    // A drag disposed of while it runs goes once Qt's drag loop is done with it.
-    if (drag->isTracking())
-        drag->deleteLater();
+    // A drag disposed of while it runs goes once Qt's drag loop (and TrackDrag) is done with it.
+    if (drag->isTracking() || isKeptAlive(drag))
+        deleteWhenFree(drag);
     else
         delete drag;
     return noErr;

@@ -6,7 +6,7 @@
 #include <Velmar/Windows.h>
 
 #include "drag/DragPrivate.h"
-#include "foundation/GuardedCall.h"
+#include "foundation/Lifetime.h"
 #include "windows/WindowFilters.h"
 
 #include <QDropEvent>
@@ -39,9 +39,16 @@ void accept(AQtWindow* window, QDropEvent* e)
     }
 }
 
+// A handler may have disposed the window: its port went with it.
+bool usableTarget(AQtWindow* window)
+{
+    return !window->IsDeletePending();
+}
+
 void flush(AQtWindow* window)
 {
-    QDFlushPortBuffer(window->GetPort(), nullptr);
+    if (usableTarget(window))
+        QDFlushPortBuffer(window->GetPort(), nullptr);
 }
 
 void forgetTarget()
@@ -75,7 +82,7 @@ bool onDragEvent(AQtWindow* window, QEvent* e)
         const bool entered = callTrackingHandlers(window, kDragTrackingEnterHandler);
         // A handler that threw has ended the tracking of this window.
         if (callTrackingHandlers(window, kDragTrackingEnterWindow) && entered
-            && (drag = DragInstance()))
+            && usableTarget(window) && (drag = DragInstance()))
             drag->setTarget(window);
         flush(window);
         return true;
@@ -91,7 +98,7 @@ bool onDragEvent(AQtWindow* window, QEvent* e)
             drag->setDropData(move->mimeData());
         const bool tracked = callTrackingHandlers(window, kDragTrackingInWindow);
         flush(window);
-        if (tracked && (drag = DragInstance()))
+        if (tracked && usableTarget(window) && (drag = DragInstance()))
             drag->setTarget(window); // the repeat starts again from this move
         return true;
     }
@@ -134,10 +141,10 @@ bool dispatch(AQtWindow* window, const List& own, const List& global, Call call)
     const List globalHandlers = global;
     const QPointer<AQtWindow> alive(window);
     for (const List* list : {&windowHandlers, &globalHandlers}) {
-        for (const auto& [handler, refCon] : *list) {
+        for (const auto& entry : *list) {
             if (!alive || window->IsDeletePending())
                 return false;
-            if (!guarded([&] { call(handler); }))
+            if (!guarded([&] { call(entry.first); }))
                 return false;
         }
     }

@@ -8,6 +8,7 @@
 #include "drag/DragStartChecker.h"
 #include "drag/DragTabSwitcher.h"
 #include "foundation/Conversions.h"
+#include "foundation/Lifetime.h"
 #include "foundation/LiveHandles.h"
 
 #include <QApplication>
@@ -80,6 +81,8 @@ OSErr TrackDrag(Drag* drag, const EventRecord* event, RgnHandle region)
     QWidget* source = sourceWidget(event);
     if (!source)
         return dragNotAcceptedErr;
+    // Disposed by a handler while it runs, the drag stays until this call is done.
+    KeepAlive keep(drag);
     const QPointer<Drag> alive(drag);
     const QPointer<QWidget> sourceAlive(source);
 
@@ -89,7 +92,14 @@ OSErr TrackDrag(Drag* drag, const EventRecord* event, RgnHandle region)
         data->setUrls({QUrl::fromLocalFile(QDir::tempPath() + kPlaceholderFile)});
         data->setData(QStringLiteral("application/x-dnditemdata"), QByteArray());
     }
-    Q_EMIT drag->m_mimeData->initData(drag->m_mimeData);
+    {
+        HostCallScope hostCode;
+        Q_EMIT drag->m_mimeData->initData(drag->m_mimeData);
+    }
+    if (!alive || DragInstance() != drag) { // the host's exporter disposed of it
+        delete qdrag;
+        return dragNotAcceptedErr;
+    }
     qdrag->setMimeData(drag->m_mimeData);
     drag->m_qdrag = qdrag;
 
@@ -113,7 +123,7 @@ OSErr TrackDrag(Drag* drag, const EventRecord* event, RgnHandle region)
         if (data)
             data->setPhase(outside ? MimeData::Phase::DroppedOutside : MimeData::Phase::Ended);
     } else {
-        qdrag->deleteLater(); // never run: ours to delete
+        deleteWhenFree(qdrag); // never run: ours to delete
     }
     // Qt deletes its drag (and the data it owns) itself: another application may still ask
     // for the data after the drop.

@@ -2,6 +2,7 @@
 
 #include "events/EventQueue.h"
 #include "events/TimerRegistry.h"
+#include "foundation/Lifetime.h"
 #include "host/Replaceable.h"
 
 #include <QCoreApplication>
@@ -110,9 +111,14 @@ void VelmarEventLoopTimer::timerEvent(QTimerEvent* event)
     m_lastFire = now;
     m_hasFired = true;
 
-    // The procedure may remove this very timer; the registry then defers the deletion.
+    // The procedure may remove this very timer; the registry then defers the deletion until
+    // this call is done.
+    KeepAlive keep(this);
     m_firing = true;
-    m_callback(this, m_userData);
+    {
+        HostCallScope hostCode;
+        m_callback(this, m_userData);
+    }
     m_firing = false;
 
     repaintDirtyPorts(0);

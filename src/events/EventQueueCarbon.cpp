@@ -3,6 +3,7 @@
 #include "events/EventQueue.h"
 #include "events/EventQueueHooks.h"
 #include "events/HandlerWindows.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/MacErrors.h>
 
@@ -36,6 +37,7 @@ OSStatus FlushSpecificEventsFromQueue(EventQueueRef queue, EventComparatorUPP co
 {
     if (!VELMAR_CHECK_QUEUE(queue) || !comparator)
         return eventInternalErr;
+    const Private::HostCallScope hostCode; // the comparator
     queue->removeIf([comparator, data](Private::EventQueueItem* item) { return comparator(item, data); });
     if (Private::LegacyEventProcessing())
         Private::ClearPendingUpdateEvents(comparator, data);
@@ -47,6 +49,7 @@ EventRef FindSpecificEventInQueue(EventQueueRef queue, EventComparatorUPP compar
 {
     if (!VELMAR_CHECK_QUEUE(queue) || !comparator)
         return nullptr;
+    const Private::HostCallScope hostCode; // the comparator
     if (EventRef found = queue->findIf(
             [comparator, data](Private::EventQueueItem* item) { return comparator(item, data); }))
         return found;

@@ -8,6 +8,7 @@
 #include "events/EventQueueHooks.h"
 #include "events/KeyCodeTables.h"
 #include "events/TimerRegistry.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/Application.h>
 #include <Velmar/CarbonEventHandlers.h>
@@ -207,15 +208,15 @@ bool VelmarEventWaiter::ProcessCarbonEvents(UInt32 count, const EventTypeSpec* l
                 // A classic loop sees only what it asked for; the Carbon handlers see the rest,
                 // once each: the items leave the queue before any handler (which may wait
                 // itself) runs.
-                std::vector<EventQueueItemSmartPtr> others;
-                queue.removeIf([&](EventQueueItem* item) {
-                    if (matches(item) && item->isEventRecordCompatible())
-                        return false;
-                    others.emplace_back(item);
-                    return true;
-                });
-                for (const EventQueueItemSmartPtr& item : others) {
-                    if (!item->IsSynchronized())
+                // One at a time, each leaving the queue just before its handlers run: what an
+                // earlier handler revoked (its window disposed) or took is no longer queued
+                // and is never delivered; what handlers post waits for the next look.
+                const std::vector<EventQueueItemSmartPtr> queued(queue.items().begin(),
+                                                                 queue.items().end());
+                for (const EventQueueItemSmartPtr& item : queued) {
+                    if (item->revoked || (matches(item.get()) && item->isEventRecordCompatible()))
+                        continue;
+                    if (queue.remove(item.get()) && !item->IsSynchronized())
                         dispatch(item);
                 }
             }
@@ -288,9 +289,10 @@ OSStatus VelmarEventWaiter::receive(UInt32 count, const EventTypeSpec* list, dou
                     timer.setSingleShot(true);
                     timer.start(timerMilliseconds(timeout));
                 }
-                // Qt 6 has no flag for it: objects deleted later go now, as the old flag did.
+                // Qt 6 has no flag for it: objects deleted later go now, as the old flag did
+                // (not while host code, and so library code for them, is on the stack).
                 if (deferredDelete)
-                    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+                    flushDeferredDeletions();
                 // Events queued while nobody waited must wake this loop too.
                 gMainEventQueue.RaiseQueueChangedSignal();
                 loop.exec(flags);

@@ -1,4 +1,5 @@
 #include "events/HandlerCall.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/Diagnostics.h>
 #include <Velmar/MacErrors.h>
@@ -48,7 +49,11 @@ OSStatus EventHandlerCall::invokeNextHandler()
         if (!handler || !applies(*handler))
             continue;
         m_current = handler;
-        const OSStatus result = handler->handler(this, m_item.get(), handler->userData);
+        OSStatus result;
+        {
+            HostCallScope hostCode;
+            result = handler->handler(this, m_item.get(), handler->userData);
+        }
         m_current = nullptr;
         if (result == noErr)
             return noErr;

@@ -3,6 +3,7 @@
 #include "events/EventQueue.h"
 #include "events/EventQueueHooks.h"
 #include "events/TimerRegistry.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/CarbonEventHandlers.h>
 #include <Velmar/FeatureFlags.h>
@@ -20,7 +21,7 @@ void EventQueue::ProcessNonCarbonEvents(QEventLoop::ProcessEventsFlags flags)
         const bool wasInside = m_inNonCarbonProcessing;
         m_inNonCarbonProcessing = true;
         if (DeferrredDeleteInProcessNonCarbonEvents(kFeatureFlagQuery))
-            QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+            flushDeferredDeletions();
         QCoreApplication::processEvents(flags);
         m_inNonCarbonProcessing = wasInside;
     }

@@ -2,6 +2,7 @@
 
 #include "events/EventQueue.h"
 #include "events/EventLoopTimer.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/Application.h>
 
@@ -63,7 +64,7 @@ bool TimerRegistry::remove(VelmarEventLoopTimer* timer)
     if (timer->isFiring()) {
         // Removed from inside its own procedure: delete once its timer event is done.
         timer->stop();
-        timer->deleteLater();
+        deleteWhenFree(timer);
     } else {
         delete timer;
     }

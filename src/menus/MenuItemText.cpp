@@ -1,5 +1,6 @@
 // Items from item strings, and item texts.
 #include "menus/MenuPrivate.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/TextUtils.h>
 
@@ -60,7 +61,7 @@ void DeleteMenuItem(MenuRef menu, UInt16 item)
 {
     if (QAction* action = itemOf(menu, item)) {
         menu->removeAction(action);
-        action->deleteLater();
+        deleteWhenFree(action);
     }
 }
 

@@ -1,5 +1,6 @@
 // The live menus, the menu list, reference counts and item look-up.
 #include "menus/MenuPrivate.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/Application.h>
 
@@ -57,10 +58,11 @@ void registerMenu(QMenu* menu)
 void destroyMenu(QMenu* menu)
 {
     LiveHandles<QMenu>::instance().remove(menu);
-    // A menu that is showing runs Qt's own loop: it goes when that loop is done with it.
-    if (menu->isVisible()) {
+    // A menu that is showing runs Qt's own loop, and a pop-up call holds its menu: it goes
+    // when they are done with it.
+    if (menu->isVisible() || isKeptAlive(menu)) {
         menu->hide();
-        menu->deleteLater();
+        deleteWhenFree(menu);
     } else {
         delete menu;
     }

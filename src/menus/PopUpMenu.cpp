@@ -1,6 +1,7 @@
 // Pop-up menus: QMenu::exec, or the scrolling list for menus too long for the screen.
 #include "menus/MenuPrivate.h"
 #include "menus/QMenuListPopup.h"
+#include "foundation/Lifetime.h"
 
 #include <Velmar/Application.h>
 #include <Velmar/HostCore.h>
@@ -72,8 +73,11 @@ SInt32 PopUpMenuSelect(
         throwOutOfRange("Velmar::PopUpMenuSelect", "popUpItem", popUpItem);
 
     const QPoint at(left, top);
+    // Host code may run while the pop-up shows (timers, handlers) and dispose of the menu or
+    // its items: the menu stays until this call is done, a deleted item is no choice.
+    KeepAlive keep(menu.get());
     QPointer<QMenu> guard(menu.get());
-    QAction* chosen = nullptr;
+    QPointer<QAction> chosen;
     {
         PopupMenuScope scope(menu);
         if (allowList && NeedsListPopup(at, menu)) {
@@ -84,7 +88,7 @@ SInt32 PopUpMenuSelect(
         }
     }
     // The host may have disposed of the menu from inside the pop-up's loop.
-    if (!guard || !chosen)
+    if (!guard || !chosen || !isLive(guard.data()))
         return 0;
     return CalculateMenuSelectInfo(chosen);
 }

@@ -32,6 +32,9 @@ QMenuListPopup::QMenuListPopup(QMenu* menu, bool sorted)
 void QMenuListPopup::fill()
 {
     m_list->clear();
+    m_actions.clear();
+    if (!m_menu)
+        return;
     ApplyMenuFont(m_menu);
     m_list->setFont(m_menu->font());
     QString longest;
@@ -39,7 +42,8 @@ void QMenuListPopup::fill()
         if (action->isSeparator())
             continue;
         auto* item = new QListWidgetItem(action->text(), m_list);
-        item->setData(Qt::UserRole, QVariant::fromValue(static_cast<QObject*>(action)));
+        item->setData(Qt::UserRole, int(m_actions.size()));
+        m_actions.emplace_back(action);
         if (action->isChecked())
             m_list->setCurrentItem(item);
         if (action->text().size() > longest.size())
@@ -73,8 +77,10 @@ void QMenuListPopup::itemSelected()
 {
     if (!isVisible())
         return;
-    if (QListWidgetItem* item = m_list->currentItem())
-        m_chosen = qobject_cast<QAction*>(item->data(Qt::UserRole).value<QObject*>());
+    if (QListWidgetItem* item = m_list->currentItem()) {
+        const std::size_t row = std::size_t(item->data(Qt::UserRole).toInt());
+        m_chosen = row < m_actions.size() ? m_actions[row].data() : nullptr;
+    }
     hide();
 }
 

@@ -2,6 +2,9 @@
 #pragma once
 
 #include <QFrame>
+#include <QPointer>
+
+#include <vector>
 
 class QAction;
 class QEventLoop;
@@ -32,8 +35,10 @@ protected:
 private:
     void fill();
 
-    QMenu* m_menu;
-    QAction* m_chosen = nullptr;
+    QPointer<QMenu> m_menu;
+    // The listed items, by row: the host may delete any of them while the list shows.
+    std::vector<QPointer<QAction>> m_actions;
+    QPointer<QAction> m_chosen;
     QListWidget* m_list;
     QEventLoop* m_loop = nullptr;
 };

@@ -7,6 +7,7 @@
 #include <Velmar/Windows.h>
 
 #include "foundation/Conversions.h"
+#include "foundation/Lifetime.h"
 #include "quickdraw/CurrentPort.h"
 #include "textedit/TEEditorSupport.h"
 #include "textedit/TERecordPrivate.h"
@@ -103,7 +104,8 @@ bool callClickLoop(TEPtr* te)
     TEClickLoopUPP loop = teData(te)->clickLoop;
     if (!loop)
         return true;
-    const bool goOn = loop(te) != 0;
+    bool goOn = false;
+    callGuarded([&] { goOn = loop(te) != 0; }, "A click loop threw");
     return goOn && isLive(te) && te->Qt();
 }
 
@@ -239,7 +241,7 @@ void TEPtr::Dispose()
     // Later, not now: the record may be disposed from inside its own click tracking.
     if (m_clip) {
         m_clip->hide();
-        m_clip->deleteLater();
+        deleteWhenFree(m_clip);
     }
     m_editor = nullptr;
     m_clip = nullptr;

@@ -120,7 +120,7 @@ void AQtWindow::Dispose()
     dirtyPortSetRemove(this);
     delete m_port;
     m_port = nullptr;
-    deleteLater();
+    deleteWhenFree(this);
 }
 
 // ---- Port and drawing mode ---------------------------------------------------------------------
@@ -311,14 +311,16 @@ bool AQtWindow::IsGrowBoxIconDrawnByDecorator()
 void AQtWindow::UpdateSizeLimits()
 {
     if (m_enableEventHandling && m_eventHandler)
-        m_eventHandler->UpdateSizeLimits();
+        callWindowHandler(this, [this] { m_eventHandler->UpdateSizeLimits(); });
 }
 
 bool AQtWindow::GrowEvent(SInt32 left, SInt32 top, SInt32 right, SInt32 bottom)
 {
     if (!m_enableEventHandling || !m_eventHandler)
         return false;
-    return m_eventHandler->GrowEventHandler(left, top, right, bottom);
+    bool grown = false;
+    return callWindowHandler(this, [&] { grown = m_eventHandler->GrowEventHandler(left, top, right, bottom); })
+        && grown;
 }
 
 void AQtWindow::SetInHighlightState(bool inHighlight)

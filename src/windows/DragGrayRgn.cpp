@@ -99,13 +99,20 @@ SInt32 DragGrayRgn(RgnHandle region, Point start, const Rect* limitRect, const R
     }
     QPoint last(start.h, start.v);
     QPoint total(0, 0);
+    bool disposed = false;
     {
+        KeepAlive keep(window);
         MouseTracker tracker(window);
         tracker.run([&](const QPoint& global, bool leftHeld) {
-            if (actionProc)
-                actionProc();
+            // The action procedure may dispose the window (and its port): the drag ends.
+            if (actionProc && !callWindowHandler(window, actionProc)) {
+                outline.Hide();
+                disposed = true;
+                return false;
+            }
             // Limit and slop rectangles are in the port's local coordinates, as `start` is.
-            const QPoint local = globalToWindow(window, global) + port->origin();
+            // (The window's port: a procedure switching its drawing mode makes a new one.)
+            const QPoint local = globalToWindow(window, global) + window->GetPort()->origin();
             QPoint step(0, 0);
             if (limit.contains(local)) {
                 step = local - last;
@@ -133,6 +140,8 @@ SInt32 DragGrayRgn(RgnHandle region, Point start, const Rect* limitRect, const R
             return true;
         });
     }
+    if (disposed)
+        return 0;
     return SInt32((UInt32(UInt16(total.y())) << 16) | UInt32(UInt16(total.x())));
 }
 

@@ -6,7 +6,7 @@
 #include <Velmar/QtGrafPort.h>
 
 #include "events/EventQueue.h"
-#include "foundation/GuardedCall.h"
+#include "foundation/Lifetime.h"
 #include "events/KeyModifiers.h"
 #include "events/QtInputConversion.h"
 #include "windows/WindowFilters.h"
@@ -40,18 +40,12 @@ void schedule(AQtWindow* window, UInt32 eventClass, UInt32 eventKind, const QRec
     ScheduleEvent(item, EventQueueItem::GuessMerge);
 }
 
-// The host's handler may throw anything; none of it may unwind through Qt.
-template <typename Call>
-void guarded(Call call)
-{
-    callGuarded(call, "A serious error has occurred!\nIt is recommended that you restart "
-                      "the application immediately.");
-}
-
 } // namespace
 
 bool AQtWindow::event(QEvent* e)
 {
+    // Whatever the host does from the handlers this event reaches, this object outlives it.
+    KeepAlive keep(this);
     if (m_deletePending)
         return e->type() == QEvent::DeferredDelete ? QWidget::event(e) : false;
 
@@ -115,8 +109,9 @@ bool AQtWindow::handleShowHide(QEvent* e)
         dirtyPortSetAdd(this);
     if (!supportLegacyMacEventProcessing()) {
         m_updateRegion = QRegion(rect());
-        if (m_enableEventHandling && m_eventHandler)
-            guarded([this] { m_eventHandler->ShowEventHandler(); });
+        if (m_enableEventHandling && m_eventHandler
+            && !callWindowHandler(this, [this] { m_eventHandler->ShowEventHandler(); }))
+            return true;
     } else {
         m_updateRegion = QRegion();
         addUpdateRegion(rect());
@@ -151,7 +146,7 @@ void AQtWindow::resizeEvent(QResizeEvent* e)
     m_contentSize = e->size();
     scaleGrafPortToWindow(e->size());
     if (m_enableEventHandling && m_eventHandler)
-        guarded([this] { m_eventHandler->ResizeEventHandler(); });
+        callWindowHandler(this, [this] { m_eventHandler->ResizeEventHandler(); });
 }
 
 void AQtWindow::inputMethodEvent(QInputMethodEvent* e)
@@ -166,8 +161,9 @@ void AQtWindow::inputMethodEvent(QInputMethodEvent* e)
 
 void AQtWindow::SetInResizeState(bool inResize)
 {
-    if (m_enableEventHandling && m_eventHandler)
-        m_eventHandler->SetInResizeState(inResize);
+    if (m_enableEventHandling && m_eventHandler
+        && !callWindowHandler(this, [&] { m_eventHandler->SetInResizeState(inResize); }))
+        return;
     if (inResize) {
         m_inResizeState = true;
         return;
@@ -189,7 +185,10 @@ bool AQtWindow::AcceptDropOnWindowTab(Qt::KeyboardModifiers modifiers)
 {
     if (!m_enableEventHandling || !m_eventHandler)
         return false;
-    return m_eventHandler->DropOnWindowTabHandler(SInt16(macModifiers(modifiers)));
+    bool accepted = false;
+    const SInt16 mods = SInt16(macModifiers(modifiers));
+    return callWindowHandler(this, [&] { accepted = m_eventHandler->DropOnWindowTabHandler(mods); })
+        && accepted;
 }
 
 void AQtWindow::SetContentSize(const QSize& size)

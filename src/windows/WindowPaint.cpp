@@ -88,6 +88,7 @@ void AQtWindow::paintEvent(QPaintEvent* e)
         overlayInput = {m_updateRegion, m_dirtyPortRect};
 
     const QRegion eventRegion = e->region();
+    QtGrafPort* const port = m_port;
     QPainter local;
     QPainter* painter = &local;
     if (m_enableDirectQtDrawing) {
@@ -104,13 +105,21 @@ void AQtWindow::paintEvent(QPaintEvent* e)
     if (m_enableEventHandling && !m_updateStarted && !m_updateRegion.isEmpty()
         && !SuspendUpdateEvents::checkFor(this))
         consumeUpdateRegion(painter, eventRegion, fill);
+    // The handler disposed the window, or switched its drawing mode and so made a new port:
+    // the painter taken above went with the old port. A new paint shows the new state.
+    if (m_deletePending || m_port != port) {
+        if (!m_deletePending)
+            update();
+        return;
+    }
 
     if (!m_enableDirectQtDrawing) {
         m_port->EndPaint();
         local.begin(this);
         paintBackBuffer(local, eventRegion);
-        if (m_eventHandler && SupportVelmarWindowOverlays(kFeatureFlagQuery))
-            m_eventHandler->DrawOverlays(local, eventRegion);
+        if (m_eventHandler && SupportVelmarWindowOverlays(kFeatureFlagQuery)
+            && !callWindowHandler(this, [&] { m_eventHandler->DrawOverlays(local, eventRegion); }))
+            return;
         if (!m_dirtyPortRect.isNull() && eventRegion.united(m_dirtyPortRect) == eventRegion)
             m_dirtyPortRect = QRect();
     }
@@ -162,8 +171,11 @@ void AQtWindow::consumeUpdateRegion(QPainter* painter, const QRegion& eventRegio
             if (fill)
                 fillBackground(m_port, m_enableDirectQtDrawing ? painter : nullptr,
                                m_updateRegion.boundingRect());
-            else if (m_eventHandler)
-                m_eventHandler->PaintEventHandler(painter, m_updateRegion);
+            else if (m_eventHandler
+                     && !callWindowHandler(this, [&] {
+                            m_eventHandler->PaintEventHandler(painter, m_updateRegion);
+                        }))
+                return;
             if (m_updateStarted) {
                 m_updateStarted = false;
                 visiblePart -= eventRegion;

@@ -6,6 +6,7 @@
 #include <Velmar/MacErrors.h>
 
 #include "foundation/LiveHandles.h"
+#include "foundation/Lifetime.h"
 
 #include <QEvent>
 #include <QPointer>
@@ -35,6 +36,18 @@ private:
     bool& m_flag;
     bool m_saved;
 };
+
+// Calls the host's handler for `window` (what it throws is contained; it counts as host code on
+// the stack). False when the window was disposed meanwhile: the caller then stops touching it,
+// though the object itself stays until the caller's own KeepAlive (if any) ends.
+template <typename Call>
+bool callWindowHandler(AQtWindow* window, Call call)
+{
+    KeepAlive keep(window);
+    callGuarded(call, "A serious error has occurred!\nIt is recommended that you restart the "
+                      "application immediately.");
+    return keep.alive() && !window->IsDeletePending();
+}
 
 // ---- Which windows exist ---------------------------------------------------------------
 // Every live window object, creation order (deletion-pending ones included until deleted).
