@@ -8,6 +8,7 @@
 #include <QCoreApplication>
 #include <QEvent>
 #include <QPointer>
+#include <QWindow>
 
 namespace Velmar {
 
@@ -57,6 +58,12 @@ bool AQtWindow::flushDirtyPort(bool immediately)
     if (isVisible() && m_dirtyPortRect.isValid()) {
         if (m_enableDirectQtDrawing)
             return false; // the rectangle is kept for the next paint event
+        // Not on the screen yet: a repaint would paint nothing, so the area stays dirty and
+        // goes up with the paint that follows the exposure.
+        if (const QWindow* handle = window()->windowHandle(); handle && !handle->isExposed()) {
+            update(m_dirtyPortRect);
+            return true;
+        }
         if (immediately && !testAttribute(Qt::WA_WState_ConfigPending)) {
             const bool handling = m_enableEventHandling;
             const bool inFlush = m_inFlush;

@@ -12,6 +12,12 @@
 #include "windows/WindowPorts.h"
 #include "windows/WindowPrivate.h"
 
+#include <QDeadlineTimer>
+#include <QTimer>
+#include <QWindow>
+
+#include <algorithm>
+
 namespace Velmar {
 
 using namespace Private;
@@ -21,11 +27,33 @@ namespace {
 constexpr QEventLoop::ProcessEventsFlags kShowHideProcessing =
     QEventLoop::ExcludeUserInputEvents | QEventLoop::ExcludeSocketNotifiers;
 
+// How long ShowWindow waits for the window system to put a new window on the screen.
+constexpr int kExposeWaitMs = 2000;
+
 // A show or hide of a window the host waits on takes effect at once under legacy processing.
 void settleShowHide(AQtWindow* window)
 {
     if (window->supportLegacyMacEventProcessing())
         ProcessNonCarbonEvents(kShowHideProcessing);
+}
+
+// A shown window is on the screen when ShowWindow returns: a host that draws next and never
+// waits (it computes, or polls Button) must see its drawing, and the window's first paint
+// (which erases what is invalid) must come before that drawing, not after it.
+void waitUntilExposed(AQtWindow* window)
+{
+    const QPointer<AQtWindow> alive(window);
+    QDeadlineTimer deadline(kExposeWaitMs);
+    for (;;) {
+        if (!alive || alive->IsDeletePending() || !alive->isVisible())
+            return;
+        const QWindow* handle = alive->window()->windowHandle();
+        if (!handle || handle->isExposed() || deadline.hasExpired())
+            return;
+        // Wakes the wait below should the window system say nothing.
+        QTimer::singleShot(std::min<qint64>(20, deadline.remainingTime()), [] {});
+        ProcessNonCarbonEvents(kShowHideProcessing | QEventLoop::WaitForMoreEvents);
+    }
 }
 
 QRect withOrigin(AQtWindow* window, const QRect& rect)
@@ -43,8 +71,10 @@ void ShowWindow(WindowRef window)
         port->pixmap->clear();
     const bool wasHidden = !window->isVisible();
     window->SetWindowVisible(true);
-    if (wasHidden)
+    if (wasHidden) {
         settleShowHide(window);
+        waitUntilExposed(window);
+    }
 }
 
 void HideWindow(WindowRef window)

@@ -77,6 +77,22 @@ private Q_SLOTS:
         DisposeRgn(rgn);
     }
 
+    // A host that draws right after ShowWindow and never waits (it computes, or polls the
+    // button) sees what it drew: the window is on the screen when ShowWindow returns.
+    void drawingBeforeTheFirstWait()
+    {
+        Window w(R(150, 150, 210, 250));
+        ShowWindow(w);
+        OnPort port(w);
+        const RGBColor red(65535, 0, 0);
+        RGBForeColor(&red);
+        const Rect all = R(0, 0, 60, 100);
+        PaintRect(&all);
+        QDFlushPortBuffer(GetWindowPort(w), nullptr);
+        const QImage shown = screenPixels(QRect(w->mapToGlobal(QPoint(0, 0)), QSize(100, 60)));
+        QCOMPARE(shown.pixelColor(50, 30), QColor(Qt::red));
+    }
+
     // The classic cycle: BeginUpdate limits drawing to the invalid area and validates it,
     // EndUpdate puts the whole port back and flushes to the screen.
     void drawingReachesTheScreen()
