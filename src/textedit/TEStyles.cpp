@@ -12,12 +12,46 @@
 #include <QTextBlock>
 #include <QTextCharFormat>
 #include <QTextDocument>
+#include <QTextFragment>
+
+#include <vector>
 
 namespace Velmar {
 
 using namespace Private;
 
 namespace {
+
+constexpr Style kFormatFaces = Style(bold | italic | underline);
+
+qreal pointsOf(const QFont& font)
+{
+    return font.pointSizeF() > 0 ? font.pointSizeF() : 9.0;
+}
+
+// One run of a single character format inside a selection.
+struct FormatRun {
+    int from, to;
+    QFont font;
+};
+
+// The runs of [start, end), each with its font resolved against the editor's.
+std::vector<FormatRun> runsOf(CommonTextEditAPI* editor, int start, int end)
+{
+    std::vector<FormatRun> runs;
+    const QFont base = editor->widget()->font();
+    for (QTextBlock block = editor->document()->findBlock(start);
+         block.isValid() && block.position() < end; block = block.next()) {
+        for (auto it = block.begin(); !it.atEnd(); ++it) {
+            const QTextFragment fragment = it.fragment();
+            const int from = std::max(start, fragment.position());
+            const int to = std::min(end, fragment.position() + fragment.length());
+            if (from < to)
+                runs.push_back({from, to, fragment.charFormat().font().resolve(base)});
+        }
+    }
+    return runs;
+}
 
 // A style as a character format; `mode` says which parts are set.
 QTextCharFormat formatOf(SInt16 mode, const TextStyle& style, const QFont& current)
@@ -34,10 +68,8 @@ QTextCharFormat formatOf(SInt16 mode, const TextStyle& style, const QFont& curre
     }
     if (mode & doSize)
         format.setFontPointSize(std::max<qreal>(1, style.tsSize) * 0.75);
-    if (mode & addSize) {
-        const qreal points = current.pointSizeF() > 0 ? current.pointSizeF() : 9.0;
-        format.setFontPointSize(std::max<qreal>(0.75, points + style.tsSize * 0.75));
-    }
+    if (mode & addSize) // to the size of the text it goes on (`current`)
+        format.setFontPointSize(std::max<qreal>(0.75, pointsOf(current) + style.tsSize * 0.75));
     if (mode & doColor)
         format.setForeground(toQColor(style.tsColor));
     return format;
@@ -81,17 +113,37 @@ void TESetStyle(SInt16 mode, const TextStyle* style, Boolean, TEPtr* te)
     if (!editor || !editor->isStyled())
         return;
     QTextCursor cursor = editor->textCursor();
-    QTextCharFormat format = formatOf(mode, *style, editor->widget()->font());
-    if ((mode & doToggle) && (mode & doFace)) {
-        // Toggle: a face bit the whole selection has is taken off, otherwise it is set.
-        const QFont current = cursor.charFormat().font();
-        const Style have = Style(GetTxFaceFromQFont(current));
-        TextStyle toggled = *style;
-        toggled.tsFace = Style(
-            (have & style->tsFace) == style->tsFace ? have & ~style->tsFace : have | style->tsFace);
-        format.merge(formatOf(doFace, toggled, current));
+    const bool toggle = (mode & doToggle) && (mode & doFace);
+    if (!cursor.hasSelection()) {
+        // The style of what is typed next.
+        const QFont current = cursor.charFormat().font().resolve(editor->widget()->font());
+        TextStyle next = *style;
+        if (toggle)
+            next.tsFace = Style(GetTxFaceFromQFont(current) ^ (style->tsFace & kFormatFaces));
+        cursor.mergeCharFormat(formatOf(mode, next, current));
+        editor->setTextCursor(cursor);
+        return;
     }
-    cursor.mergeCharFormat(format);
+    // Sizes are added to, and faces toggled on, each run's own style; a face bit the whole
+    // selection has is taken off it, any other one is set on all of it.
+    const std::vector<FormatRun> runs =
+        runsOf(editor, cursor.selectionStart(), cursor.selectionEnd());
+    Style everywhere = kFormatFaces;
+    for (const FormatRun& run : runs)
+        everywhere = Style(everywhere & GetTxFaceFromQFont(run.font));
+    const Style taken = Style(style->tsFace & everywhere);
+    const Style given = Style(style->tsFace & ~everywhere);
+    QTextCursor part(editor->document());
+    part.beginEditBlock();
+    for (const FormatRun& run : runs) {
+        TextStyle own = *style;
+        if (toggle)
+            own.tsFace = Style((GetTxFaceFromQFont(run.font) & ~taken) | given);
+        part.setPosition(run.from);
+        part.setPosition(run.to, QTextCursor::KeepAnchor);
+        part.mergeCharFormat(formatOf(mode, own, run.font));
+    }
+    part.endEditBlock();
     editor->setTextCursor(cursor);
 }
 

@@ -247,8 +247,24 @@ Handle TEGetText(TEPtr* te)
 
 void TEInsert(const void* text, SInt32 length, TEPtr* te, Boolean)
 {
-    if (VELMAR_CHECK_TE(te) && editorOf(te, "TEInsert"))
-        insertEditorText(te, editorTextFromBytes(text, length));
+    CommonTextEditAPI* editor = VELMAR_CHECK_TE(te) ? editorOf(te, "TEInsert") : nullptr;
+    if (!editor)
+        return;
+    // The text goes in just before the selection, which keeps its characters: hosts that
+    // want it replaced call TEDelete first.
+    const QTextCursor selection = editor->textCursor();
+    const int anchor = selection.anchor();
+    const int position = selection.position();
+    const int before = editor->document()->characterCount();
+    QTextCursor at(editor->document());
+    at.setPosition(std::min(anchor, position));
+    editor->setTextCursor(at);
+    insertEditorText(te, editorTextFromBytes(text, length));
+    const int added = editor->document()->characterCount() - before;
+    QTextCursor restored(editor->document());
+    restored.setPosition(anchor + added);
+    restored.setPosition(position + added, QTextCursor::KeepAnchor);
+    editor->setTextCursor(restored);
 }
 
 void TEDelete(TEPtr* te)

@@ -126,6 +126,11 @@ private Q_SLOTS:
         unsigned short utf16[6];
         QCOMPARE(te->getTextUTF16(utf16, 6), SInt32(5)); // cut to the buffer
         QCOMPARE(utf16[5], (unsigned short)0);
+        QCOMPARE(te->selStart(), SInt16(9)); // the caret stays after what went in before it
+        TESetSelect(0, 5, te);
+        TEInsert("<", 1, te); // before the selection, which keeps its characters
+        QCOMPARE(te->selStart(), SInt16(1));
+        QCOMPARE(te->selEnd(), SInt16(6));
         // An embedded NUL ends the text; bytes the encoding cannot map become U+FFFD.
         TESetText("ab\0cd", 5, te);
         QCOMPARE(te.text(), QStringLiteral("ab"));
@@ -303,6 +308,28 @@ private Q_SLOTS:
         TESetStyle(doFace, &style, 1, plain); // one style only: left alone
         TEGetStyle(1, &got, nullptr, nullptr, plain);
         QCOMPARE(int(got.tsFace), int(plain->txFace()));
+
+        // Sizes add to each run's own size; a face bit part of the selection lacks is set on
+        // all of it, and one all of it has is taken off.
+        Record runs(true);
+        runs.set("small LARGE");
+        TESetSelect(6, 11, runs);
+        style.tsSize = 24;
+        style.tsFace = bold;
+        TESetStyle(doSize | doFace, &style, 1, runs);
+        TEGetStyle(1, &got, nullptr, nullptr, runs);
+        const SInt16 small = got.tsSize;
+        TESetSelect(0, 11, runs);
+        style.tsSize = 2;
+        TESetStyle(addSize | doFace | doToggle, &style, 1, runs);
+        for (const auto& [offset, size] : {std::pair{1, small + 2}, std::pair{7, 26}}) {
+            TEGetStyle(SInt16(offset), &got, nullptr, nullptr, runs);
+            QCOMPARE(got.tsSize, SInt16(size));
+            QCOMPARE(int(got.tsFace), int(bold));
+        }
+        TESetStyle(doFace | doToggle, &style, 1, runs);
+        TEGetStyle(7, &got, nullptr, nullptr, runs);
+        QCOMPARE(int(got.tsFace), int(normal));
     }
 
     void undoAndEditBlocks()
