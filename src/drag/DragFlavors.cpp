@@ -126,10 +126,8 @@ OSErr GetDragModifiers(
         *modifiers = SInt16(GetCurrentKeyModifiers());
     if (mouseDownModifiers)
         *mouseDownModifiers = 0;
-    // Meta has no part in a drop's modifiers.
-    const auto dropped = Qt::KeyboardModifiers(drag->dropModifiers()) & ~Qt::MetaModifier;
     if (mouseUpModifiers)
-        *mouseUpModifiers = SInt16(macModifiers(dropped));
+        *mouseUpModifiers = SInt16(macModifiers(Qt::KeyboardModifiers(drag->dropModifiers())));
     return noErr;
 }
 

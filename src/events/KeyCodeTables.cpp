@@ -1,5 +1,5 @@
 // The keyboard tables behind key events: Windows virtual keys to Mac character and key codes,
-// Qt keys to virtual keys, typed characters to Mac codes, and Mac key codes back to virtual
+// typed characters to Mac codes, and Mac key codes back to virtual
 // keys. Built once, before the first wait.
 #include "events/KeyCodeTables.h"
 
@@ -51,41 +51,6 @@ constexpr UInt8 kKeypadKeys[10] = {0x52, 0x53, 0x54, 0x55, 0x56, 0x57, 0x58, 0x5
 constexpr UInt8 kFunctionKeys[15] = {0x7A, 0x78, 0x63, 0x76, 0x60, 0x61, 0x62, 0x64,
                                      0x65, 0x6D, 0x67, 0x6F, 0x69, 0x6B, 0x71};
 
-// The Qt key each Windows virtual key stands for in Qt's Windows key mapper. Unlisted keys
-// are Qt::Key_unknown or character keys the layout decides; neither names a Qt key here.
-// The keypad separator and decimal keys keep Qt 4's Key_Comma and Key_Period (later Qt
-// versions leave them to the layout): without them the keypad's decimal point would fall
-// through to virtual key 0x2E and arrive as a forward delete.
-struct QtKeyRow {
-    int vk;
-    int qtKey;
-};
-constexpr QtKeyRow kQtKeyRows[] = {
-    {0x03, Qt::Key_Cancel}, {0x08, Qt::Key_Backspace}, {0x09, Qt::Key_Tab},
-    {0x0C, Qt::Key_Clear}, {0x0D, Qt::Key_Return}, {0x10, Qt::Key_Shift},
-    {0x11, Qt::Key_Control}, {0x12, Qt::Key_Alt}, {0x13, Qt::Key_Pause},
-    {0x14, Qt::Key_CapsLock}, {0x1B, Qt::Key_Escape}, {0x1F, Qt::Key_Mode_switch},
-    {0x20, Qt::Key_Space}, {0x21, Qt::Key_PageUp}, {0x22, Qt::Key_PageDown},
-    {0x23, Qt::Key_End}, {0x24, Qt::Key_Home}, {0x25, Qt::Key_Left}, {0x26, Qt::Key_Up},
-    {0x27, Qt::Key_Right}, {0x28, Qt::Key_Down}, {0x29, Qt::Key_Select},
-    {0x2A, Qt::Key_Printer}, {0x2B, Qt::Key_Execute}, {0x2C, Qt::Key_Print},
-    {0x2D, Qt::Key_Insert}, {0x2E, Qt::Key_Delete}, {0x2F, Qt::Key_Help},
-    {0x5B, Qt::Key_Meta}, {0x5C, Qt::Key_Meta}, {0x5D, Qt::Key_Menu}, {0x5F, Qt::Key_Sleep},
-    {0x6A, Qt::Key_Asterisk}, {0x6B, Qt::Key_Plus}, {0x6C, Qt::Key_Comma},
-    {0x6D, Qt::Key_Minus}, {0x6E, Qt::Key_Period}, {0x6F, Qt::Key_Slash},
-    {0x90, Qt::Key_NumLock}, {0x91, Qt::Key_ScrollLock},
-    {0x93, Qt::Key_Massyo}, {0x94, Qt::Key_Touroku}, {0xA0, Qt::Key_Shift},
-    {0xA1, Qt::Key_Shift}, {0xA2, Qt::Key_Control}, {0xA3, Qt::Key_Control},
-    {0xA4, Qt::Key_Alt}, {0xA5, Qt::Key_Alt}, {0xA6, Qt::Key_Back}, {0xA7, Qt::Key_Forward},
-    {0xA8, Qt::Key_Refresh}, {0xA9, Qt::Key_Stop}, {0xAA, Qt::Key_Search},
-    {0xAB, Qt::Key_Favorites}, {0xAC, Qt::Key_HomePage}, {0xAD, Qt::Key_VolumeMute},
-    {0xAE, Qt::Key_VolumeDown}, {0xAF, Qt::Key_VolumeUp}, {0xB0, Qt::Key_MediaNext},
-    {0xB1, Qt::Key_MediaPrevious}, {0xB2, Qt::Key_MediaStop}, {0xB3, Qt::Key_MediaPlay},
-    {0xB4, Qt::Key_LaunchMail}, {0xB5, Qt::Key_LaunchMedia}, {0xB6, Qt::Key_Launch0},
-    {0xB7, Qt::Key_Launch1}, {0xFA, Qt::Key_Play}, {0xFB, Qt::Key_Zoom},
-    {0xFE, Qt::Key_Clear},
-};
-
 // Non-ASCII Mac OS Roman characters and the US Mac keyboard key that types them with Option
 // or Shift-Option. Left out: the accented letters the Option dead keys compose (two keys),
 // and the four spacing accents ´ ¨ ˆ ˜, which Shift-Option types on the dead keys themselves
@@ -132,7 +97,6 @@ constexpr char kAsciiKeys[][2] = {
 
 struct Tables {
     std::array<MacKeyPair, 256> byVirtualKey{};
-    std::unordered_map<int, int> virtualKeyByQtKey;
     std::unordered_map<char16_t, MacKeyPair> byCharacter;
     std::array<int, 256> virtualKeyByMacKey{};
 };
@@ -150,22 +114,6 @@ Tables build()
         t.byVirtualKey[VK::A + i] = {UInt8('A' + i), kLetterKeys[i]};
     for (int i = 0; i < 15; ++i)
         t.byVirtualKey[VK::F1 + i] = {0x10, kFunctionKeys[i]};
-
-    // Every virtual key with the Qt key Qt's mapper gives it; a later key wins.
-    std::array<int, 256> qtKeyOf;
-    qtKeyOf.fill(Qt::Key_unknown);
-    for (const QtKeyRow& row : kQtKeyRows)
-        qtKeyOf[row.vk] = row.qtKey;
-    for (int i = 0; i < 10; ++i)
-        qtKeyOf[VK::Numpad0 + i] = Qt::Key_0 + i;
-    for (int i = 0; i < 24; ++i)
-        qtKeyOf[VK::F1 + i] = Qt::Key_F1 + i;
-    for (int vk = 0; vk < 256; ++vk)
-        t.virtualKeyByQtKey[qtKeyOf[vk]] = vk;
-    // Qt's own names for two keys the mapper leaves to Windows: Backtab is Tab, the keypad
-    // Enter has the converter's slot of its own.
-    t.virtualKeyByQtKey[Qt::Key_Backtab] = VK::Tab;
-    t.virtualKeyByQtKey[Qt::Key_Enter] = VK::QtEnter;
 
     for (char c = 'a'; c <= 'z'; ++c) {
         t.byCharacter[char16_t(c)] = {UInt8(c), kLetterKeys[c - 'a']};
@@ -202,13 +150,6 @@ void buildKeyboardTables()
 MacKeyPair macKeyForVirtualKey(int virtualKey)
 {
     return virtualKey >= 0 && virtualKey < 256 ? tables().byVirtualKey[virtualKey] : MacKeyPair{};
-}
-
-int virtualKeyForQtKey(int qtKey)
-{
-    const auto& index = tables().virtualKeyByQtKey;
-    auto it = index.find(qtKey);
-    return it == index.end() ? -1 : it->second;
 }
 
 bool macKeyForCharacter(char16_t character, MacKeyPair* out)

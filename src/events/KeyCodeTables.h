@@ -14,8 +14,6 @@ struct MacKeyPair {
 void buildKeyboardTables();
 // The Mac character and key code of a Windows virtual key; (0, 0) for none.
 MacKeyPair macKeyForVirtualKey(int virtualKey);
-// The Windows virtual key of a Qt key, or -1 when the index has none.
-int virtualKeyForQtKey(int qtKey);
 // The Mac OS Roman code and key code of a typed UTF-16 character; false when not in the table.
 bool macKeyForCharacter(char16_t character, MacKeyPair* out);
 // The virtual key of a Mac key code (0 for none; the A key's code 0 always answers none).

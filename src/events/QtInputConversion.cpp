@@ -8,6 +8,7 @@
 #include "events/KeyCodeTables.h"
 #include "events/PostEvent.h"
 #include "host/Replaceable.h"
+#include "platform/KeyTables.h"
 
 #include <Velmar/Diagnostics.h>
 #include <Velmar/Events.h>
@@ -179,7 +180,7 @@ bool ConvertKeyEvent(QKeyEvent* e, EventRef item)
     const UInt16 c = GetUTF16Char(e);
     MacKeyPair codes;
     if (!(c && !(e->modifiers() & Qt::KeypadModifier) && macKeyForCharacter(char16_t(c), &codes))) {
-        int vk = virtualKeyForQtKey(e->key());
+        int vk = Platform::virtualKeyIndexForQtKey(e->key());
         if (vk < 0)
             vk = e->key() < 256 ? e->key() : 0;
         codes = macKeyForVirtualKey(vk);

@@ -5,6 +5,9 @@
 
 #include <QtCore/qnamespace.h>
 
+#include <array>
+#include <unordered_map>
+
 namespace Velmar::Private::Platform {
 
 namespace {
@@ -26,20 +29,13 @@ int lookup(const KeyPair (&table)[N], UInt32 key)
     return 0;
 }
 
+// The keys whose answer here differs from the index below: the side-less modifier keys
+// (key state is kept for them, the index names the right-hand ones), keys Qt's Windows mapper
+// has no name for, and the US layout's character keys.
 const KeyPair kQtKeys[] = {
-    {Qt::Key_Escape, VK::Escape}, {Qt::Key_Tab, VK::Tab}, {Qt::Key_Backtab, VK::Tab},
-    {Qt::Key_Backspace, VK::Back}, {Qt::Key_Return, VK::Return}, {Qt::Key_Enter, VK::QtEnter},
-    {Qt::Key_Insert, VK::Insert}, {Qt::Key_Delete, VK::Delete}, {Qt::Key_Pause, VK::Pause},
-    {Qt::Key_Print, VK::Snapshot}, {Qt::Key_SysReq, VK::Snapshot}, {Qt::Key_Clear, VK::Clear},
-    {Qt::Key_Home, VK::Home}, {Qt::Key_End, VK::End}, {Qt::Key_Left, VK::Left},
-    {Qt::Key_Up, VK::Up}, {Qt::Key_Right, VK::Right}, {Qt::Key_Down, VK::Down},
-    {Qt::Key_PageUp, VK::Prior}, {Qt::Key_PageDown, VK::Next},
-    {Qt::Key_Shift, VK::Shift}, {Qt::Key_Control, VK::Control}, {Qt::Key_Meta, VK::LWin},
-    {Qt::Key_Alt, VK::Menu}, {Qt::Key_AltGr, VK::Menu}, {Qt::Key_CapsLock, VK::Capital},
-    {Qt::Key_NumLock, VK::NumLock}, {Qt::Key_ScrollLock, VK::ScrollLock},
-    {Qt::Key_Super_L, VK::LWin}, {Qt::Key_Super_R, VK::RWin}, {Qt::Key_Menu, VK::Apps},
-    {Qt::Key_Help, VK::Help}, {Qt::Key_Cancel, VK::Cancel}, {Qt::Key_Select, VK::Select},
-    {Qt::Key_Execute, VK::Execute}, {Qt::Key_Printer, VK::Print}, {Qt::Key_Space, VK::Space},
+    {Qt::Key_Shift, VK::Shift}, {Qt::Key_Control, VK::Control}, {Qt::Key_Alt, VK::Menu},
+    {Qt::Key_AltGr, VK::Menu}, {Qt::Key_SysReq, VK::Snapshot},
+    {Qt::Key_Super_L, VK::LWin}, {Qt::Key_Super_R, VK::RWin},
     // US layout: a shifted symbol is reported on the key that carries it.
     {Qt::Key_Exclam, VK::Digit0 + 1}, {Qt::Key_At, VK::Digit0 + 2},
     {Qt::Key_NumberSign, VK::Digit0 + 3}, {Qt::Key_Dollar, VK::Digit0 + 4},
@@ -93,6 +89,62 @@ const KeyPair kKeysyms[] = {
     {0x3c, VK::Oem102} /* "<" unshifted: the extra key of ISO keyboards */,
 };
 
+// The Qt key each Windows virtual key stands for in Qt's Windows key mapper. Unlisted keys
+// are Qt::Key_unknown or character keys the layout decides; neither names a Qt key here.
+// The keypad separator and decimal keys keep Qt 4's Key_Comma and Key_Period (later Qt
+// versions leave them to the layout): without them the keypad's decimal point would fall
+// through to virtual key 0x2E and arrive as a forward delete.
+struct QtKeyRow {
+    int vk;
+    int qtKey;
+};
+constexpr QtKeyRow kQtKeyRows[] = {
+    {0x03, Qt::Key_Cancel}, {0x08, Qt::Key_Backspace}, {0x09, Qt::Key_Tab},
+    {0x0C, Qt::Key_Clear}, {0x0D, Qt::Key_Return}, {0x10, Qt::Key_Shift},
+    {0x11, Qt::Key_Control}, {0x12, Qt::Key_Alt}, {0x13, Qt::Key_Pause},
+    {0x14, Qt::Key_CapsLock}, {0x1B, Qt::Key_Escape}, {0x1F, Qt::Key_Mode_switch},
+    {0x20, Qt::Key_Space}, {0x21, Qt::Key_PageUp}, {0x22, Qt::Key_PageDown},
+    {0x23, Qt::Key_End}, {0x24, Qt::Key_Home}, {0x25, Qt::Key_Left}, {0x26, Qt::Key_Up},
+    {0x27, Qt::Key_Right}, {0x28, Qt::Key_Down}, {0x29, Qt::Key_Select},
+    {0x2A, Qt::Key_Printer}, {0x2B, Qt::Key_Execute}, {0x2C, Qt::Key_Print},
+    {0x2D, Qt::Key_Insert}, {0x2E, Qt::Key_Delete}, {0x2F, Qt::Key_Help},
+    {0x5B, Qt::Key_Meta}, {0x5C, Qt::Key_Meta}, {0x5D, Qt::Key_Menu}, {0x5F, Qt::Key_Sleep},
+    {0x6A, Qt::Key_Asterisk}, {0x6B, Qt::Key_Plus}, {0x6C, Qt::Key_Comma},
+    {0x6D, Qt::Key_Minus}, {0x6E, Qt::Key_Period}, {0x6F, Qt::Key_Slash},
+    {0x90, Qt::Key_NumLock}, {0x91, Qt::Key_ScrollLock},
+    {0x93, Qt::Key_Massyo}, {0x94, Qt::Key_Touroku}, {0xA0, Qt::Key_Shift},
+    {0xA1, Qt::Key_Shift}, {0xA2, Qt::Key_Control}, {0xA3, Qt::Key_Control},
+    {0xA4, Qt::Key_Alt}, {0xA5, Qt::Key_Alt}, {0xA6, Qt::Key_Back}, {0xA7, Qt::Key_Forward},
+    {0xA8, Qt::Key_Refresh}, {0xA9, Qt::Key_Stop}, {0xAA, Qt::Key_Search},
+    {0xAB, Qt::Key_Favorites}, {0xAC, Qt::Key_HomePage}, {0xAD, Qt::Key_VolumeMute},
+    {0xAE, Qt::Key_VolumeDown}, {0xAF, Qt::Key_VolumeUp}, {0xB0, Qt::Key_MediaNext},
+    {0xB1, Qt::Key_MediaPrevious}, {0xB2, Qt::Key_MediaStop}, {0xB3, Qt::Key_MediaPlay},
+    {0xB4, Qt::Key_LaunchMail}, {0xB5, Qt::Key_LaunchMedia}, {0xB6, Qt::Key_Launch0},
+    {0xB7, Qt::Key_Launch1}, {0xFA, Qt::Key_Play}, {0xFB, Qt::Key_Zoom},
+    {0xFE, Qt::Key_Clear}, // after 0x0C: Clear is OEM Clear, which has no Mac key
+};
+
+std::unordered_map<int, int> buildQtKeyIndex()
+{
+    std::unordered_map<int, int> index;
+    // Every virtual key with the Qt key Qt's mapper gives it; a later key wins.
+    std::array<int, 256> qtKeyOf;
+    qtKeyOf.fill(Qt::Key_unknown);
+    for (const QtKeyRow& row : kQtKeyRows)
+        qtKeyOf[row.vk] = row.qtKey;
+    for (int i = 0; i < 10; ++i)
+        qtKeyOf[VK::Numpad0 + i] = Qt::Key_0 + i;
+    for (int i = 0; i < 24; ++i)
+        qtKeyOf[VK::F1 + i] = Qt::Key_F1 + i;
+    for (int vk = 0; vk < 256; ++vk)
+        index[qtKeyOf[vk]] = vk;
+    // Qt's own names for two keys the mapper leaves to Windows: Backtab is Tab, the keypad
+    // Enter has the converter's slot of its own.
+    index[Qt::Key_Backtab] = VK::Tab;
+    index[Qt::Key_Enter] = VK::QtEnter;
+    return index;
+}
+
 const KeyPair kGenericModifiers[] = {
     {VK::LShift, VK::Shift}, {VK::RShift, VK::Shift}, {VK::LControl, VK::Control},
     {VK::RControl, VK::Control}, {VK::LMenu, VK::Menu}, {VK::RMenu, VK::Menu},
@@ -112,7 +164,19 @@ int virtualKeyFromQtKey(int qtKey, bool keypad)
         if (const int vk = lookup(kQtKeypadKeys, UInt32(qtKey)))
             return vk;
     }
-    return qtKey < 0 ? 0 : lookup(kQtKeys, UInt32(qtKey));
+    if (qtKey < 0)
+        return 0;
+    if (const int vk = lookup(kQtKeys, UInt32(qtKey)))
+        return vk;
+    const int vk = virtualKeyIndexForQtKey(qtKey);
+    return vk > 0 && qtKey != Qt::Key_unknown ? vk : 0;
+}
+
+int virtualKeyIndexForQtKey(int qtKey)
+{
+    static const std::unordered_map<int, int> sIndex = buildQtKeyIndex();
+    const auto it = sIndex.find(qtKey);
+    return it == sIndex.end() ? -1 : it->second;
 }
 
 int virtualKeyFromKeysym(UInt32 keysym)

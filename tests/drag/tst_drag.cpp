@@ -64,7 +64,8 @@ void deliver(QEvent::Type type, WindowRef window, const QMimeData* data)
         QDragMoveEvent move(at, Qt::CopyAction, data, Qt::LeftButton, Qt::NoModifier);
         QCoreApplication::sendEvent(window.get(), &move);
     } else {
-        QDropEvent drop(QPointF(at), Qt::CopyAction, data, Qt::LeftButton, Qt::ShiftModifier);
+        QDropEvent drop(QPointF(at), Qt::CopyAction, data, Qt::LeftButton,
+                        Qt::ShiftModifier | Qt::MetaModifier);
         QCoreApplication::sendEvent(window.get(), &drop);
     }
 }
@@ -150,7 +151,7 @@ private Q_SLOTS:
                 "B:4", "app B:4", "B:5", "app B:5"});
         SInt16 up = 0;
         GetDragModifiers(m_drag, nullptr, nullptr, &up);
-        QCOMPARE(up, SInt16(shiftKey));
+        QCOMPARE(up, SInt16(shiftKey | cmdKey)); // Meta is the command key here too
 
         // Flavours of the data over the window.
         SInt32 size = 0;
