@@ -25,7 +25,7 @@ using namespace WindowTest;
 namespace {
 
 // What a handler does to the window it is called for.
-enum class Act { Dispose, DisposeAndWait, SwitchMode };
+enum class Act { Dispose, DisposeAndWait, SwitchMode, HideAndWait, RepaintAndWait };
 
 void waitBriefly()
 {
@@ -35,9 +35,11 @@ void waitBriefly()
 
 void act(Act what, AQtWindow* window)
 {
-    if (what == Act::SwitchMode) {
-        window->enableDirectQtDrawing(!window->isDirectQtDrawing());
-        return;
+    switch (what) {
+    case Act::SwitchMode: window->enableDirectQtDrawing(!window->isDirectQtDrawing()); return;
+    case Act::HideAndWait: HideWindow(window); waitBriefly(); return;
+    case Act::RepaintAndWait: window->repaint(); waitBriefly(); return;
+    default: break;
     }
     DisposeWindow(window);
     if (what == Act::DisposeAndWait)
@@ -105,6 +107,9 @@ private Q_SLOTS:
         QTest::newRow("paint switches to back buffer") << int(H::Paint) << int(Act::SwitchMode) << true;
         QTest::newRow("show disposes and waits") << int(H::Show) << int(Act::DisposeAndWait) << false;
         QTest::newRow("resize disposes and waits") << int(H::Resize) << int(Act::DisposeAndWait) << false;
+        QTest::newRow("paint hides and waits") << int(H::Paint) << int(Act::HideAndWait) << false;
+        QTest::newRow("paint re-enters, direct") << int(H::Paint) << int(Act::RepaintAndWait) << true;
+        QTest::newRow("show hides and waits") << int(H::Show) << int(Act::HideAndWait) << false;
     }
     void windowHandlers()
     {
@@ -238,6 +243,7 @@ private Q_SLOTS:
             if (event->window == gWindow) {
                 ++delivered;
                 DisposeWindow(gWindow);
+                waitBriefly(); // purges the rest itself, from inside the outer purge
             }
             return noErr;
         };
