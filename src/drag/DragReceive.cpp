@@ -137,7 +137,8 @@ bool dispatch(AQtWindow* window, const List& own, const List& global, Call call)
         for (const auto& [handler, refCon] : *list) {
             if (!alive || window->IsDeletePending())
                 return false;
-            if (!guarded([&] { call(handler); }))
+            // Copied into the lambda: clang before 16 cannot capture a structured binding.
+            if (!guarded([&, handler = handler] { call(handler); }))
                 return false;
         }
     }
