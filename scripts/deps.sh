@@ -16,9 +16,10 @@ VELMAR_PACKAGES=(
   libicu-dev libbenchmark-dev
   xvfb xauth fonts-liberation2 libxtst6 openbox x11-utils
 )
-# clang++ itself, and the runtimes -fsanitize=address,undefined,fuzzer link against
-# (libclang_rt.*: only recommended by clang, so never installed without it here).
-VELMAR_CLANG_PACKAGES=(clang libclang-rt-dev)
+# clang++ itself, the runtimes -fsanitize=address,undefined,fuzzer link against
+# (libclang_rt.*: only recommended by clang, so not installed with it here), and
+# llvm-symbolizer, without which a sanitizer report shows addresses instead of lines.
+VELMAR_CLANG_PACKAGES=(clang libclang-rt-dev llvm)
 
 want_clang=0
 for arg in "$@"; do
