@@ -15,8 +15,9 @@ root="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 seconds="${1:-60}"
 [ $# -gt 0 ] && shift
 case "$seconds" in
-  '' | *[!0-9]*)
-    echo "velmar: error: the time per target is a number of seconds, not '$seconds'" >&2
+  '' | *[!0-9]* | 0*)
+    # (0 would mean "no limit" to libFuzzer.)
+    echo "velmar: error: the time per target is a whole number of seconds from 1, not '$seconds'" >&2
     exit 2
     ;;
 esac
