@@ -1,6 +1,13 @@
 #!/usr/bin/env bash
 # Makes sure the Debian packages the build needs are present; installs what is missing.
-# Quick when everything is there. Sourced or run by demo.sh and test.sh.
+# Quick when everything is there. Run by demo.sh, test.sh and fuzz.sh.
+#
+#   scripts/deps.sh           the GCC build
+#   scripts/deps.sh clang     also clang and its sanitizer and libFuzzer runtimes
+#   scripts/deps.sh fuzz      the same (what a -DVELMAR_FUZZ=ON build needs)
+#
+# The clang packages are also added when CXX names clang or VELMAR_CMAKE_ARGS turns on
+# VELMAR_FUZZ, so that `CXX=clang++ ./scripts/test.sh` works on a fresh machine.
 set -euo pipefail
 
 VELMAR_PACKAGES=(
@@ -9,6 +16,27 @@ VELMAR_PACKAGES=(
   libicu-dev libbenchmark-dev
   xvfb xauth fonts-liberation2 libxtst6 openbox x11-utils
 )
+# clang++ itself, the runtimes -fsanitize=address,undefined,fuzzer link against
+# (libclang_rt.*: only recommended by clang, so not installed with it here), and
+# llvm-symbolizer, without which a sanitizer report shows addresses instead of lines.
+VELMAR_CLANG_PACKAGES=(clang libclang-rt-dev llvm)
+
+want_clang=0
+for arg in "$@"; do
+  case "$arg" in
+    clang | fuzz) want_clang=1 ;;
+    *)
+      echo "velmar: error: unknown argument '$arg' (expected: clang, fuzz)" >&2
+      exit 2
+      ;;
+  esac
+done
+cxx="${CXX:-c++}"
+case "$(basename "${cxx%% *}")" in clang*) want_clang=1 ;; esac
+case " ${VELMAR_CMAKE_ARGS:-} " in *VELMAR_FUZZ=ON* | *VELMAR_FUZZ:BOOL=ON*) want_clang=1 ;; esac
+if [ "$want_clang" -eq 1 ]; then
+  VELMAR_PACKAGES+=("${VELMAR_CLANG_PACKAGES[@]}")
+fi
 
 missing=()
 for p in "${VELMAR_PACKAGES[@]}"; do

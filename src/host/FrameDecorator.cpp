@@ -69,7 +69,7 @@ private:
     std::optional<QPoint> m_dragFrom;
 };
 
-FrameDecorator::FrameDecorator(ManagedWindow* window) : m_window(window)
+FrameDecorator::FrameDecorator(ManagedWindow* window)
 {
     QWidget* content = window->GetWidget();
     m_content = content;

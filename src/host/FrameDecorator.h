@@ -36,7 +36,6 @@ public:
     static QSize frameExtra() { return QSize(2 * kBorder, kTitleHeight + 2 * kBorder); }
 
 private:
-    ManagedWindow* m_window;
     QPointer<QWidget> m_content;
     QPointer<FrameWidget> m_frame;
 };

@@ -70,8 +70,6 @@ private:
     bool m_shown = false;
 };
 
-constexpr SInt32 kOutsideSlop = SInt32(0x80008000u);
-
 } // namespace
 
 SInt32 DragGrayRgn(RgnHandle region, Point start, const Rect* limitRect, const Rect* slopRect,

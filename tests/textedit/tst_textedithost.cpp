@@ -20,7 +20,7 @@ using namespace WindowTest;
 
 namespace {
 
-constexpr unsigned long kControl = 0xffe3, kShift = 0xffe1, kBackSpace = 0xff08;
+constexpr unsigned long kControl = 0xffe3, kBackSpace = 0xff08;
 const Rect kView = R(20, 20, 80, 220); // two or three lines high
 
 class Host {
