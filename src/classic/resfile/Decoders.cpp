@@ -1,0 +1,1 @@
+#include "classic/resfile/Decoders.h"
