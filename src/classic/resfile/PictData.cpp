@@ -83,6 +83,11 @@ bool readPixels(BigEndianReader& in, const PixMapHeader& h, bool packed, bool di
     if (!rgb24 && h.rowBytes < (width * depth + 7) / 8)
         return false;
 
+    // The rows must be there before the image is made: a PackBits unit of two bytes yields
+    // at most 128 units, so a short operand cannot claim a huge image.
+    const qint64 leastStored = plain || rgb24 ? height * rowLength : height * std::max<qint64>(1, rowLength / 128);
+    if (!in.has(leastStored))
+        return false;
     if (image) {
         *image = QImage(int(width), int(height), QImage::Format_RGB32);
         if (image->isNull())

@@ -55,6 +55,14 @@ SInt16 clamp16(qint64 v)
     return SInt16(std::clamp<qint64>(v, -32767, 32767));
 }
 
+// Positions a picture moves step by step (origin, pen, text) stay within this range, so that
+// no number of steps can overflow.
+constexpr int kFar = 1 << 20;
+QPoint clampFar(const QPoint& p)
+{
+    return QPoint(std::clamp(p.x(), -kFar, kFar), std::clamp(p.y(), -kFar, kFar));
+}
+
 // The classic eight colours of FgColor/BkColor (version 1 pictures).
 RGBColor oldStyleColor(UInt32 value, bool fore)
 {
@@ -385,7 +393,12 @@ private:
         case 0x0009: { UInt8 p[8]; readPattern(p); const Pattern pat = classicPattern(p); PenPat(&pat); break; }
         case 0x000A: readPattern(m_fillPattern); break;
         case 0x000B: m_ovalSize = m_in.point(); break;
-        case 0x000C: m_oy += m_in.s16(); m_ox += m_in.s16(); break; // dv then dh
+        case 0x000C: { // dh then dv
+            const int dh = m_in.s16(), dv = m_in.s16();
+            m_ox = std::clamp(m_ox + dh, -kFar, kFar);
+            m_oy = std::clamp(m_oy + dv, -kFar, kFar);
+            break;
+        }
         case 0x000D: TextSize(textSize(m_in.s16())); break;
         case 0x000E: { const RGBColor c = oldStyleColor(m_in.u32(), true); RGBForeColor(&c); break; }
         case 0x000F: { const RGBColor c = oldStyleColor(m_in.u32(), false); RGBBackColor(&c); break; }
@@ -415,18 +428,18 @@ private:
             const int dh = m_in.s8(), dv = m_in.s8();
             if (!m_in.ok())
                 return false;
-            const QPoint to = m_pen + QPoint(dh, dv);
+            const QPoint to = clampFar(m_pen + QPoint(dh, dv));
             moveTo(m_pen);
             lineTo(to);
             m_pen = to;
             break;
         }
         case 0x0028: { m_textLoc = point(); const QByteArray t = m_in.pascal(); if (m_in.ok()) text(t); break; }
-        case 0x0029: { m_textLoc.rx() += m_in.u8(); const QByteArray t = m_in.pascal(); if (m_in.ok()) text(t); break; }
-        case 0x002A: { m_textLoc.ry() += m_in.u8(); const QByteArray t = m_in.pascal(); if (m_in.ok()) text(t); break; }
+        case 0x0029: { m_textLoc = clampFar(m_textLoc + QPoint(m_in.u8(), 0)); const QByteArray t = m_in.pascal(); if (m_in.ok()) text(t); break; }
+        case 0x002A: { m_textLoc = clampFar(m_textLoc + QPoint(0, m_in.u8())); const QByteArray t = m_in.pascal(); if (m_in.ok()) text(t); break; }
         case 0x002B: {
-            m_textLoc.rx() += m_in.u8();
-            m_textLoc.ry() += m_in.u8();
+            const int dh = m_in.u8(), dv = m_in.u8();
+            m_textLoc = clampFar(m_textLoc + QPoint(dh, dv));
             const QByteArray t = m_in.pascal();
             if (m_in.ok())
                 text(t);
