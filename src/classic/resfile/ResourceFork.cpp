@@ -212,6 +212,8 @@ std::optional<ResourceFork> ResourceFork::unwrap(const QByteArray& file, QString
         if (!wrapped->resourceFork.isEmpty()) {
             if (auto fork = parse(wrapped->resourceFork, &why))
                 return fork;
+        } else if (why.isEmpty()) {
+            why = QStringLiteral("the resource fork is empty");
         }
         // A MacBinary I header is recognised by a few zero bytes only: the file may be a raw
         // fork after all. Any other container's verdict stands.
