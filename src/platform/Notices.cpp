@@ -1,0 +1,44 @@
+#include "platform/Notices.h"
+
+namespace Velmar::Private::Platform {
+
+namespace {
+
+NoticeSink gSink = nullptr;
+// A handful of kinds at most: a short list beats a set.
+constexpr int kMaxKinds = 16;
+const char* gGiven[kMaxKinds] = {};
+int gGivenCount = 0;
+
+bool alreadyGiven(const char* text)
+{
+    for (int i = 0; i < gGivenCount; ++i) {
+        if (gGiven[i] == text)
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
+NoticeSink setNoticeSink(NoticeSink sink)
+{
+    NoticeSink previous = gSink;
+    gSink = sink;
+    return previous;
+}
+
+void noticeOnce(const char* text)
+{
+    if (!text || alreadyGiven(text))
+        return;
+    if (gSink && gSink(text) && gGivenCount < kMaxKinds)
+        gGiven[gGivenCount++] = text;
+}
+
+void resetNotices()
+{
+    gGivenCount = 0;
+}
+
+} // namespace Velmar::Private::Platform
