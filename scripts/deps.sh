@@ -9,6 +9,10 @@ VELMAR_PACKAGES=(
   libicu-dev libbenchmark-dev
   xvfb xauth fonts-liberation2 libxtst6 openbox x11-utils
 )
+# The Wayland test run (VELMAR_TEST_PLATFORM=wayland) needs a compositor and Qt's plugin.
+if [ "${VELMAR_TEST_PLATFORM:-}" = "wayland" ]; then
+  VELMAR_PACKAGES+=(weston qt6-wayland)
+fi
 
 missing=()
 for p in "${VELMAR_PACKAGES[@]}"; do
