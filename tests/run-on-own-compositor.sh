@@ -35,6 +35,13 @@ export WAYLAND_DISPLAY="$socket" QT_QPA_PLATFORM=wayland
 unset DISPLAY
 "$@"
 rc=$?
+# weston ends its own clients (the shell, the keyboard); one that is slow to go must not
+# keep the test running.
 kill "$weston" 2>/dev/null
-wait 2>/dev/null
+for _ in $(seq 40); do
+  kill -0 "$weston" 2>/dev/null || break
+  sleep 0.05
+done
+kill -9 "$weston" 2>/dev/null
+wait "$weston" 2>/dev/null
 exit $rc

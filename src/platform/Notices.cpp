@@ -28,12 +28,17 @@ NoticeSink setNoticeSink(NoticeSink sink)
     return previous;
 }
 
-void noticeOnce(const char* text)
+bool noticeOnce(const char* text)
 {
-    if (!text || alreadyGiven(text))
-        return;
-    if (gSink && gSink(text) && gGivenCount < kMaxKinds)
+    if (!text)
+        return false;
+    if (alreadyGiven(text))
+        return true;
+    if (!gSink || !gSink(text))
+        return false;
+    if (gGivenCount < kMaxKinds)
         gGiven[gGivenCount++] = text;
+    return true;
 }
 
 void resetNotices()

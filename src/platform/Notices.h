@@ -12,8 +12,8 @@ using NoticeSink = bool (*)(const char* text);
 NoticeSink setNoticeSink(NoticeSink sink);
 
 // Passes `text` (a string literal: its address is the kind) to the sink until the sink has
-// taken it once.
-void noticeOnce(const char* text);
+// taken it once. True once it has been taken (now or before).
+bool noticeOnce(const char* text);
 // Forgets which notices were given (tests).
 void resetNotices();
 

@@ -234,11 +234,11 @@ private Q_SLOTS:
         Platform::resetNotices();
         gNotices.clear();
         gSinkTakes = false;
-        Platform::noticeOnce(kKind);
+        QVERIFY(!Platform::noticeOnce(kKind));
         gSinkTakes = true;
-        Platform::noticeOnce(kKind);
-        Platform::noticeOnce(kKind);
-        Platform::noticeOnce(nullptr);
+        QVERIFY(Platform::noticeOnce(kKind));
+        QVERIFY(Platform::noticeOnce(kKind));
+        QVERIFY(!Platform::noticeOnce(nullptr));
         QCOMPARE(gNotices, QStringList({"kind", "kind"}));
     }
 

@@ -33,7 +33,8 @@ bool isPlacedTopLevel(const QWidget* widget)
     return widget->testAttribute(Qt::WA_Moved);
 }
 
-// Sees the first top-level window a program places, then leaves.
+// Sees the first top-level window a program places, then leaves; it stays while the notice
+// finds its log category off, so that switching the category on later still shows it.
 class PlacementWatcher : public QObject {
 public:
     using QObject::QObject;
@@ -43,10 +44,8 @@ protected:
     {
         const QEvent::Type type = event->type();
         if ((type == QEvent::Show || type == QEvent::Move) && watched->isWidgetType()
-            && isPlacedTopLevel(static_cast<QWidget*>(watched))) {
-            noticeOnce(kPlacementNotice);
+            && isPlacedTopLevel(static_cast<QWidget*>(watched)) && noticeOnce(kPlacementNotice))
             deleteLater();
-        }
         return false;
     }
 };
