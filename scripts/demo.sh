@@ -1,12 +1,13 @@
 #!/usr/bin/env bash
-# Builds and runs the demo host program. Without a display it runs under Xvfb and
-# saves a screenshot instead.
+# Builds and runs the demo host program on the desktop (X11 or Wayland). Without one it
+# runs under Xvfb and saves a screenshot instead.
 set -euo pipefail
 root="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 source "$root/scripts/prepare.sh"
 cmake --build "$build" --target velmar-demo
 demo="$build/examples/demo/velmar-demo"
-if [ -n "${DISPLAY:-}" ]; then
+# On a desktop (X11, or Wayland through Qt's wayland plugin) it runs there.
+if [ -n "${DISPLAY:-}" ] || [ -n "${WAYLAND_DISPLAY:-}" ]; then
   exec "$demo" "$@"
 fi
 shot="$build/velmar-demo.png"

@@ -37,6 +37,10 @@ case " ${VELMAR_CMAKE_ARGS:-} " in *VELMAR_FUZZ=ON* | *VELMAR_FUZZ:BOOL=ON*) wan
 if [ "$want_clang" -eq 1 ]; then
   VELMAR_PACKAGES+=("${VELMAR_CLANG_PACKAGES[@]}")
 fi
+# The Wayland test run (VELMAR_TEST_PLATFORM=wayland) needs a compositor and Qt's plugin.
+if [ "${VELMAR_TEST_PLATFORM:-}" = "wayland" ]; then
+  VELMAR_PACKAGES+=(weston qt6-wayland)
+fi
 
 missing=()
 for p in "${VELMAR_PACKAGES[@]}"; do

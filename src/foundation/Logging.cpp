@@ -3,6 +3,7 @@
 
 #include "foundation/DiagnosticsPrivate.h"
 #include "foundation/NameTable.h"
+#include "platform/Notices.h"
 #include "platform/Platform.h"
 
 #include <QtGlobal>
@@ -33,6 +34,17 @@ UInt32 gEnabledLogCategories = 0;
 
 DebugOutputHook gDebugOutputHook = nullptr;
 void* gDebugOutputContext = nullptr;
+
+// What the window system refused (platform/Notices.h) goes to the NotImpl category.
+bool logPlatformNotice(const char* text)
+{
+    if ((gEnabledLogCategories & kLogNotImpl) == 0)
+        return false;
+    VelmarLog(kLogNotImpl, "%s", text);
+    return true;
+}
+
+const bool gPlatformNoticesRouted = (Private::Platform::setNoticeSink(&logPlatformNotice), true);
 
 } // namespace
 

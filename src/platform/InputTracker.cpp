@@ -78,6 +78,7 @@ void InputTracker::track(const QEvent* event)
 void InputTracker::trackKey(const QEvent* event, bool press)
 {
     const auto* key = static_cast<const QKeyEvent*>(event);
+    m_seenKeyboard = true;
     int vk = virtualKeyFromQtKey(key->key(), key->modifiers().testFlag(Qt::KeypadModifier));
     if (vk == VK::QtEnter)
         vk = VK::Return; // Windows reports keypad Enter as Return
@@ -107,6 +108,7 @@ void InputTracker::trackButtons(const QEvent* event)
 {
     const auto* mouse = static_cast<const QMouseEvent*>(event);
     const Qt::MouseButtons buttons = mouse->buttons(); // the state after this event
+    m_pointer = mouse->globalPosition().toPoint();
     for (const ButtonKey& b : kButtons)
         setDown(b.virtualKey, buttons.testFlag(b.button));
     for (const ModifierKey& m : kModifiers)
@@ -135,6 +137,8 @@ void InputTracker::reset()
     m_lastKeyEvent = nullptr;
     m_lastKeyType = 0;
     m_lastKeyTimestamp = 0;
+    m_pointer = QPoint();
+    m_seenKeyboard = false;
 }
 
 bool InputTracker::isDown(int virtualKey) const

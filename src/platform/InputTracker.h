@@ -4,6 +4,8 @@
 
 #include <Velmar/MacTypes.h>
 
+#include <QPoint>
+
 class QEvent;
 
 namespace Velmar::Private::Platform {
@@ -22,6 +24,10 @@ public:
     bool isToggled(int virtualKey) const;
     // 0x80 while down, 0x01 when toggled, as the Windows keyboard state.
     void getState(UInt8 state[256]) const;
+    // Where the last mouse event put the pointer, in global coordinates.
+    QPoint pointerPosition() const { return m_pointer; }
+    // True once a key event arrived: the window system has a keyboard for this process.
+    bool hasSeenKeyboard() const { return m_seenKeyboard; }
 
 private:
     void setDown(int virtualKey, bool down);
@@ -33,6 +39,8 @@ private:
     const QEvent* m_lastKeyEvent = nullptr;
     int m_lastKeyType = 0;
     UInt64 m_lastKeyTimestamp = 0;
+    QPoint m_pointer;
+    bool m_seenKeyboard = false;
 };
 
 } // namespace Velmar::Private::Platform

@@ -1,13 +1,16 @@
 // The one place that talks to the operating system or the window system directly.
 // Windows virtual-key codes stay the library's key vocabulary on every platform: the codes
 // are named in platform/VirtualKeys.h, and platform/KeyTables.h turns Qt keys into them.
-// Backends: platform/windows (Win32) and platform/x11 (everything else; X11 through Qt's
-// xcb connection, Qt's own events where there is no X server).
+// Backends: platform/windows (Win32); off Windows, platform/unix picks at run time from Qt's
+// platform name (platform/WindowSystem.h): platform/x11 (the X server through Qt's xcb
+// connection), platform/wayland (what the compositor lets a client do), or Qt's own events
+// alone (offscreen, no application).
 #pragma once
 
 #include <Velmar/MacTypes.h>
 
 #include <QImage>
+#include <QPoint>
 #include <QString>
 
 class QEvent;
@@ -24,11 +27,17 @@ void getKeyboardState(UInt8 state[256]);
 // The system's left mouse button, asked of the window system where there is one.
 bool isSystemLeftButtonDown();
 
+// The pointer in global coordinates: asked of the window system where it can be (X11,
+// Windows), else where Qt's last mouse event put it (Wayland tells a client only while the
+// pointer is over one of its windows).
+QPoint pointerPosition();
+
 // The virtual key of the key that types `character` on the current layout (VkKeyScanA's low
 // byte); 0 when no key does. Without a window system to ask, the US layout.
 int virtualKeyForCharacter(char character);
 // The Windows language identifier of the keyboard layout (0x0409 US English, 0x040C French).
-// Off Windows it follows the input method's locale.
+// Off Windows it follows the input method's locale (on Wayland only once a keyboard has sent
+// this process a key: Qt 6.4 crashes asking a compositor without a seat), else the system's.
 int keyboardLanguageId();
 
 // Feeds Qt's own key and mouse events to the fallback state used where the window system

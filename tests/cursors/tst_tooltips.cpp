@@ -1,6 +1,7 @@
 // Tool tips: shown only where the user sees the parent window. Another top-level window over
 // the parent is known to the X server only, so this runs on a server of its own.
 #include "../windows/WindowTestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include <Velmar/Cursors.h>
 
@@ -52,6 +53,7 @@ class tst_ToolTips : public QObject {
 private Q_SLOTS:
     void initTestCase()
     {
+        VELMAR_REQUIRE_X11("a window placed over another at a screen position");
         m_parent.show();
         activate(m_parent);
         m_cover.setAttribute(Qt::WA_ShowWithoutActivating);

@@ -1,5 +1,7 @@
 # Installs the build tree into a temporary prefix, then configures, builds and runs a
-# consumer project that only knows find_package(Velmar) and pkg-config.
+# consumer project that only knows find_package(Velmar) and pkg-config. Then the same with
+# the Debian packages: CPack makes them, dpkg -x unpacks them into a scratch root, and the
+# consumer is built against that root.
 file(REMOVE_RECURSE ${WORK_DIR})
 set(prefix ${WORK_DIR}/prefix)
 execute_process(COMMAND ${CMAKE_COMMAND} --install ${VELMAR_BUILD_DIR} --prefix ${prefix}
@@ -7,23 +9,77 @@ execute_process(COMMAND ${CMAKE_COMMAND} --install ${VELMAR_BUILD_DIR} --prefix 
 if(NOT rc EQUAL 0)
   message(FATAL_ERROR "install into ${prefix} failed")
 endif()
-execute_process(COMMAND ${CMAKE_COMMAND} -S ${CONSUMER_SOURCE_DIR} -B ${WORK_DIR}/build -G Ninja
-    -DCMAKE_PREFIX_PATH=${prefix} -DCMAKE_BUILD_TYPE=Release
-  RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
-if(NOT rc EQUAL 0)
-  message(FATAL_ERROR "consumer configure failed:\n${out}")
-endif()
-execute_process(COMMAND ${CMAKE_COMMAND} --build ${WORK_DIR}/build
-  RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
-if(NOT rc EQUAL 0)
-  message(FATAL_ERROR "consumer build failed:\n${out}")
-endif()
-execute_process(COMMAND ${WORK_DIR}/build/velmar-consumer RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
-if(NOT rc EQUAL 0)
-  message(FATAL_ERROR "consumer run failed (${rc}):\n${out}")
-endif()
+function(build_and_run_consumer prefix_path build_dir)
+  execute_process(COMMAND ${CMAKE_COMMAND} -S ${CONSUMER_SOURCE_DIR} -B ${build_dir} -G Ninja
+      -DCMAKE_PREFIX_PATH=${prefix_path} -DCMAKE_BUILD_TYPE=Release
+    RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
+  if(NOT rc EQUAL 0)
+    message(FATAL_ERROR "consumer configure failed (${prefix_path}):\n${out}")
+  endif()
+  execute_process(COMMAND ${CMAKE_COMMAND} --build ${build_dir}
+    RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
+  if(NOT rc EQUAL 0)
+    message(FATAL_ERROR "consumer build failed (${prefix_path}):\n${out}")
+  endif()
+  execute_process(COMMAND ${build_dir}/velmar-consumer RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
+  if(NOT rc EQUAL 0)
+    message(FATAL_ERROR "consumer run failed (${prefix_path}, ${rc}):\n${out}")
+  endif()
+  set(consumer_output "${out}" PARENT_SCOPE)
+endfunction()
+
+build_and_run_consumer(${prefix} ${WORK_DIR}/build)
 file(GLOB pc ${prefix}/lib*/pkgconfig/velmar.pc ${prefix}/lib/*/pkgconfig/velmar.pc)
 if(NOT pc)
   message(FATAL_ERROR "velmar.pc was not installed")
 endif()
-message(STATUS "consumer ok: ${out}")
+message(STATUS "consumer ok: ${consumer_output}")
+
+# The packages, unpacked into a scratch root as dpkg would install them.
+set(packages ${WORK_DIR}/packages)
+execute_process(COMMAND ${CPACK_COMMAND} --config ${VELMAR_BUILD_DIR}/CPackConfig.cmake -B ${packages}
+  WORKING_DIRECTORY ${VELMAR_BUILD_DIR} RESULT_VARIABLE rc OUTPUT_VARIABLE out ERROR_VARIABLE out)
+if(NOT rc EQUAL 0)
+  message(FATAL_ERROR "cpack failed:\n${out}")
+endif()
+file(GLOB debs ${packages}/*.deb)
+list(LENGTH debs count)
+if(NOT count EQUAL 2)
+  message(FATAL_ERROR "expected a runtime and a -dev package, got: ${debs}")
+endif()
+set(root ${WORK_DIR}/root)
+foreach(deb IN LISTS debs)
+  execute_process(COMMAND dpkg-deb -f ${deb} Package Depends OUTPUT_VARIABLE fields RESULT_VARIABLE rc)
+  if(NOT rc EQUAL 0)
+    message(FATAL_ERROR "not a package: ${deb}")
+  endif()
+  # The runtime package must ask for the Qt and ICU libraries the library links.
+  if(fields MATCHES "Package: libvelmar[0-9]")
+    foreach(needed libqt6core6 libqt6gui6 libqt6widgets6 libicu)
+      if(NOT fields MATCHES "${needed}")
+        message(FATAL_ERROR "${deb} does not depend on ${needed}:\n${fields}")
+      endif()
+    endforeach()
+  elseif(NOT fields MATCHES "Package: libvelmar-dev\n.*qt6-base-dev")
+    message(FATAL_ERROR "unexpected package ${deb}:\n${fields}")
+  endif()
+  execute_process(COMMAND dpkg-deb -x ${deb} ${root} RESULT_VARIABLE rc)
+  if(NOT rc EQUAL 0)
+    message(FATAL_ERROR "dpkg-deb -x ${deb} failed")
+  endif()
+endforeach()
+build_and_run_consumer(${root}/usr ${WORK_DIR}/build-from-packages)
+# velmar.pc finds its prefix from its own place: the flags name the unpacked headers.
+file(GLOB_RECURSE pc ${root}/usr/velmar.pc)
+if(NOT pc)
+  message(FATAL_ERROR "the -dev package has no velmar.pc")
+endif()
+get_filename_component(pcdir ${pc} DIRECTORY)
+execute_process(COMMAND ${CMAKE_COMMAND} -E env PKG_CONFIG_PATH=${pcdir} pkg-config --cflags velmar
+  OUTPUT_VARIABLE flags RESULT_VARIABLE rc ERROR_VARIABLE err)
+string(REGEX MATCH "-I[^ \n]*" include_flag "${flags}")
+string(REGEX REPLACE "^-I" "" include_dir "${include_flag}")
+if(NOT rc EQUAL 0 OR NOT EXISTS "${include_dir}/Velmar/Velmar.h")
+  message(FATAL_ERROR "velmar.pc from the package does not point into its root (${pc}):\n${flags}${err}")
+endif()
+message(STATUS "packages ok: ${debs}")

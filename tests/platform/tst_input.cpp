@@ -3,17 +3,21 @@
 #include "TestSupport.h"
 
 #include "platform/InputTracker.h"
+#include "platform/Notices.h"
 #include "platform/Platform.h"
 #include "platform/VirtualKeys.h"
+#include "platform/WindowSystem.h"
 #include "platform/x11/XcbKeyboard.h"
 
 #include <QGuiApplication>
 #include <QKeyEvent>
 #include <QMouseEvent>
+#include <QWidget>
 
 using namespace Velmar::Private;
 namespace VK = Velmar::Private::VirtualKey;
 using Platform::InputTracker;
+using Platform::WindowSystem;
 using Velmar::UInt8;
 
 namespace {
@@ -33,6 +37,15 @@ void feedMouse(QEvent::Type type, Qt::MouseButton button, Qt::MouseButtons butto
     QMouseEvent event(type, QPointF(1, 1), QPointF(1, 1), button, buttons, Qt::NoModifier);
     event.setTimestamp(++gStamp);
     Platform::trackInputEvent(&event);
+}
+
+// What reached the notice sink, and whether the sink takes it (its log category is on).
+QStringList gNotices;
+bool gSinkTakes = true;
+bool recordNotice(const char* text)
+{
+    gNotices << QString::fromLatin1(text);
+    return gSinkTakes;
 }
 
 const InputTracker& tracker()
@@ -182,6 +195,73 @@ private Q_SLOTS:
             for (const auto& [character, vk] : rows)
                 QCOMPARE(Platform::virtualKeyForCharacter(character), vk);
         }
+    }
+
+    // The backend follows the name of Qt's plugin: the X server is asked only on "xcb".
+    void windowSystemFromPlatformName_data()
+    {
+        QTest::addColumn<QString>("name");
+        QTest::addColumn<int>("system");
+        QTest::newRow("xcb") << QString("xcb") << int(WindowSystem::X11);
+        QTest::newRow("wayland") << QString("wayland") << int(WindowSystem::Wayland);
+        QTest::newRow("wayland-egl") << QString("wayland-egl") << int(WindowSystem::Wayland);
+        QTest::newRow("offscreen") << QString("offscreen") << int(WindowSystem::Other);
+        QTest::newRow("minimal") << QString("minimal") << int(WindowSystem::Other);
+        QTest::newRow("windows") << QString("windows") << int(WindowSystem::Windows);
+        QTest::newRow("none") << QString("") << int(WindowSystem::None);
+    }
+    void windowSystemFromPlatformName()
+    {
+        QFETCH(QString, name);
+        QFETCH(int, system);
+        QCOMPARE(int(Platform::windowSystemForPlatformName(name)), system);
+    }
+
+    // Without the window system, the pointer is where the last mouse event put it.
+    void pointerFollowsMouseEvents()
+    {
+        QMouseEvent move(QEvent::MouseMove, QPointF(3, 4), QPointF(130, 240), Qt::NoButton,
+                         Qt::NoButton, Qt::NoModifier);
+        Platform::trackInputEvent(&move);
+        QCOMPARE(Platform::pointerPosition(), QPoint(130, 240));
+    }
+
+    // A refused request is told until the sink takes it (its category may be off), then never.
+    void noticesAreGivenOnce()
+    {
+        static const char kKind[] = "kind";
+        VelmarTest::ScopedOverride sink(&Platform::setNoticeSink, &recordNotice);
+        Platform::resetNotices();
+        gNotices.clear();
+        gSinkTakes = false;
+        QVERIFY(!Platform::noticeOnce(kKind));
+        gSinkTakes = true;
+        QVERIFY(Platform::noticeOnce(kKind));
+        QVERIFY(Platform::noticeOnce(kKind));
+        QVERIFY(!Platform::noticeOnce(nullptr));
+        QCOMPARE(gNotices, QStringList({"kind", "kind"}));
+    }
+
+    // Under a compositor: no query may reach Qt's input context before a keyboard has shown
+    // itself (Qt 6.4 crashes there without a seat), and the first placed window is noticed.
+    void waylandBackend()
+    {
+        if (Platform::windowSystem() != WindowSystem::Wayland)
+            QSKIP("runs under Wayland (VELMAR_TEST_PLATFORM=wayland)");
+        VelmarTest::ScopedOverride sink(&Platform::setNoticeSink, &recordNotice);
+        Platform::resetNotices();
+        gNotices.clear();
+        gSinkTakes = true;
+        QVERIFY(Platform::keyboardLanguageId() > 0);
+        feedMouse(QEvent::MouseMove, Qt::NoButton, Qt::NoButton); // the backend starts watching
+        QWidget first, second;
+        first.move(40, 50);
+        second.move(60, 70);
+        first.show();
+        second.show();
+        QCoreApplication::processEvents();
+        QCOMPARE(gNotices.size(), 1);
+        QVERIFY(gNotices.first().startsWith("Velmar::MoveWindow: "));
     }
 };
 

@@ -2,6 +2,7 @@
 // process reading what the library put and putting what the library reads, TextEdit's copy
 // read back as scrap, and the picture flavour's fatal end.
 #include "TestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include <Velmar/MacErrors.h>
 #include <Velmar/Scrap.h>
@@ -49,6 +50,7 @@ class TestScrap : public QObject {
 private Q_SLOTS:
     void answers()
     {
+        VELMAR_REQUIRE_CLIPBOARD();
         ScrapRef scrap = reinterpret_cast<ScrapRef>(0x1234);
         QCOMPARE(GetCurrentScrap(&scrap), OSStatus(noErr));
         QCOMPARE(scrap, nullptr);
@@ -93,6 +95,7 @@ private Q_SLOTS:
     // A second application on the same X server reads and writes the clipboard we use.
     void anotherProcess()
     {
+        VELMAR_REQUIRE_CLIPBOARD();
         const QByteArray roman = "caf\x8E na\x95ve \xA5"; // café naïve • in Mac OS Roman
         QCOMPARE(PutScrapFlavor(
                      nullptr, kScrapFlavorTypeText, 0, SInt32(roman.size()), roman.constData()),
@@ -123,6 +126,7 @@ private Q_SLOTS:
     // What a TextEdit record copies is the scrap's text.
     void textEditCopyIsTheScrap()
     {
+        VELMAR_REQUIRE_CLIPBOARD();
         const Rect bounds{100, 100, 200, 300}, view{10, 10, 90, 190};
         WindowRef window = NewCWindow(nullptr, &bounds,
             reinterpret_cast<const unsigned char*>("\x01T"), false, 0, nullptr, false, nullptr);

@@ -2,6 +2,7 @@
 // lines and geometry, styles, undo, masking, TETextBox, and hostile calls.
 #include "../quickdraw/QuickDrawTestSupport.h"
 #include "../windows/WindowTestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include <Velmar/HostEncoding.h>
 #include <Velmar/QDShapes.h>
@@ -350,6 +351,7 @@ private Q_SLOTS:
 
     void clipboardAndMasking()
     {
+        VELMAR_REQUIRE_CLIPBOARD();
         Record te;
         te.set("secret words");
         TESetSelect(0, 6, te);

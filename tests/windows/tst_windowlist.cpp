@@ -1,6 +1,7 @@
 // The window list and its order, the user focus window, and geometry and hit testing with the
 // window system's frame and with the shell's own frame (the decorated mode).
 #include "WindowTestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include "host/FrameDecorator.h"
 
@@ -91,6 +92,7 @@ private Q_SLOTS:
     }
     void geometryAndFindWindow()
     {
+        VELMAR_REQUIRE_X11("windows at screen positions");
         QFETCH(bool, decorated);
         std::unique_ptr<Brindle::DecorationManager> shell;
         if (decorated)

@@ -2,6 +2,7 @@
 // what the host draws reaches the screen, invalid areas make exactly one update event, and
 // the window's own events take the Toolbox's shape.
 #include "WindowTestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include <Velmar/QDBitmaps.h>
 #include <Velmar/QDShapes.h>
@@ -81,6 +82,7 @@ private Q_SLOTS:
     // button) sees what it drew: the window is on the screen when ShowWindow returns.
     void drawingBeforeTheFirstWait()
     {
+        VELMAR_REQUIRE_X11("reading the screen back");
         Window w(R(150, 150, 210, 250));
         ShowWindow(w);
         OnPort port(w);
@@ -97,6 +99,7 @@ private Q_SLOTS:
     // EndUpdate puts the whole port back and flushes to the screen.
     void drawingReachesTheScreen()
     {
+        VELMAR_REQUIRE_X11("reading the screen back");
         Window w(R(120, 140, 220, 340));
         w.show();
         OnPort port(w);
@@ -125,6 +128,7 @@ private Q_SLOTS:
     // strip a scroll uncovers, made invalid, joins what was already invalid.
     void copiesAndScrolls()
     {
+        VELMAR_REQUIRE_X11("reading the screen back");
         Window w(R(160, 180, 260, 380));
         w.show();
         GrafPtr world = nullptr;

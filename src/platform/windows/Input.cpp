@@ -4,6 +4,8 @@
 #include "platform/InputTracker.h"
 #include "platform/Platform.h"
 
+#include <QCursor>
+
 #include <cstring>
 
 namespace Velmar::Private::Platform {
@@ -46,6 +48,13 @@ bool isSystemLeftButtonDown()
         return InputTracker::instance().isDown(VK_LBUTTON);
     // The asynchronous state is physical; the primary button may be the right one.
     return isAsyncKeyDown(GetSystemMetrics(SM_SWAPBUTTON) ? VK_RBUTTON : VK_LBUTTON);
+}
+
+QPoint pointerPosition()
+{
+    if (!gWindowSystemInput)
+        return InputTracker::instance().pointerPosition();
+    return QCursor::pos();
 }
 
 int virtualKeyForCharacter(char character)

@@ -1,49 +1,8 @@
-// Native windows off Windows: Qt's window ids, Qt's restacking and plain images.
-#include "platform/Platform.h"
+// The X11 backend's window requests: the menu-bar strip is reserved with the EWMH strut
+// properties on the window, over Qt's own connection.
+#include "platform/Backends.h"
 
-#include <QImage>
 #include <QWidget>
-
-namespace Velmar::Private::Platform {
-
-void* nativeWindowHandle(QWidget* window)
-{
-    if (!window)
-        return nullptr;
-    return reinterpret_cast<void*>(window->winId());
-}
-
-void placeNativeWindowBehind(QWidget* window, QWidget* behind)
-{
-    if (!window || window == behind)
-        return;
-    if (!behind) {
-        window->lower();
-        return;
-    }
-    // Qt restacks siblings; top-level windows are stacked by the window manager.
-    if (!window->isWindow() && window->parentWidget() == behind->parentWidget())
-        window->stackUnder(behind);
-}
-
-QImage createWindowImage(int width, int height, QImage::Format format)
-{
-    // Toolbox coordinates are 16-bit: nothing larger can be a window's content.
-    if (width <= 0 || height <= 0 || width > 32767 || height > 32767) {
-        if (width > 0 && height > 0)
-            qWarning("createWindowImage: refused size %d x %d", width, height);
-        return QImage();
-    }
-    return QImage(width, height,
-                  format == QImage::Format_RGB16 ? format : QImage::Format_ARGB32_Premultiplied);
-}
-
-void* windowImageDeviceContext(const QImage&)
-{
-    return nullptr;
-}
-
-} // namespace Velmar::Private::Platform
 
 #if defined(VELMAR_HAVE_XCB)
 
@@ -53,7 +12,7 @@ void* windowImageDeviceContext(const QImage&)
 
 #include <cstring>
 
-namespace Velmar::Private::Platform {
+namespace Velmar::Private::Platform::X11 {
 
 namespace {
 
@@ -86,14 +45,14 @@ void reserveScreenTop(QWidget* window, int height)
     xcb_flush(connection);
 }
 
-} // namespace Velmar::Private::Platform
+} // namespace Velmar::Private::Platform::X11
 
 #else
 
-namespace Velmar::Private::Platform {
+namespace Velmar::Private::Platform::X11 {
 
 void reserveScreenTop(QWidget*, int) {}
 
-} // namespace Velmar::Private::Platform
+} // namespace Velmar::Private::Platform::X11
 
 #endif
