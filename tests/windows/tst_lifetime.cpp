@@ -2,6 +2,7 @@
 // callback the library makes, tried the way a hostile host would. Run under the sanitizer
 // build, a use after free or a null call here is a report; elsewhere a crash or a hang.
 #include "WindowTestSupport.h"
+#include "WindowSystemNeeds.h"
 
 #include <Velmar/CarbonEventHandlers.h>
 #include <Velmar/Drag.h>
@@ -133,6 +134,7 @@ private Q_SLOTS:
     // An action procedure that disposes of the window being dragged ends the drag.
     void dragGrayRgnActionDisposes()
     {
+        VELMAR_REQUIRE_X11("a mouse grab");
         Window w(R(60, 60, 160, 260));
         w.show();
         gWindow = w.get();
@@ -203,6 +205,7 @@ private Q_SLOTS:
     }
     void popUpListLosesItsMenu()
     {
+        VELMAR_REQUIRE_X11("a pop-up without a parent window");
         QFETCH(bool, wholeMenu);
         gMenu = NewMenu(300, VelmarTest::P(VelmarTest::pascal("Long")));
         for (int i = 0; i < 400; ++i)
