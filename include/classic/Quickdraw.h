@@ -273,6 +273,15 @@ VELMAR_CLASSIC_API void EraseArc(const Rect* r, short startAngle, short arcAngle
 VELMAR_CLASSIC_API void InvertArc(const Rect* r, short startAngle, short arcAngle);
 VELMAR_CLASSIC_API void FillArc(const Rect* r, short startAngle, short arcAngle,
                                 const Pattern* pat);
+VELMAR_CLASSIC_API PolyHandle OpenPoly(void);
+VELMAR_CLASSIC_API void ClosePoly(void);
+VELMAR_CLASSIC_API void KillPoly(PolyHandle poly);
+VELMAR_CLASSIC_API void OffsetPoly(PolyHandle poly, short dh, short dv);
+VELMAR_CLASSIC_API void FramePoly(PolyHandle poly);
+VELMAR_CLASSIC_API void PaintPoly(PolyHandle poly);
+VELMAR_CLASSIC_API void ErasePoly(PolyHandle poly);
+VELMAR_CLASSIC_API void InvertPoly(PolyHandle poly);
+VELMAR_CLASSIC_API void FillPoly(PolyHandle poly, const Pattern* pat);
 VELMAR_CLASSIC_API void ScrollRect(const Rect* r, short dh, short dv, RgnHandle updateRgn);
 
 VELMAR_CLASSIC_API RgnHandle NewRgn(void);

@@ -6,7 +6,8 @@
 
 #include <QEvent>
 #include <QWidget>
-#include <QWindowStateChangeEvent>
+#include <QElapsedTimer>
+#include <QTimer>
 
 #include <deque>
 
@@ -31,8 +32,54 @@ bool pending(Velmar::AQtWindow* window, short part)
     return false;
 }
 
-// A frame's changes while the button is held are the user's; others are the program's own or
-// the window system placing a new window.
+// What the window manager did to a window is read once its events have settled: a change of
+// the maximised state is a zoom, of the size a grow, of the place a drag. Changes the program
+// made itself, and the window manager placing a window it has just shown, are no clicks.
+struct Seen {
+    QRect geometry;
+    bool maximized = false;
+    bool scheduled = false;
+    QElapsedTimer shown;
+};
+
+std::unordered_map<Velmar::AQtWindow*, Seen>& seen()
+{
+    static auto* map = new std::unordered_map<Velmar::AQtWindow*, Seen>;
+    return *map;
+}
+
+QElapsedTimer gOwnChangeEnded;
+constexpr qint64 kSettleMs = 120;
+constexpr qint64 kPlacementMs = 600;
+
+void record(Velmar::AQtWindow* window, Seen& s)
+{
+    s.geometry = window->geometry();
+    s.maximized = (window->windowState() & Qt::WindowMaximized) != 0;
+}
+
+void decide(QPointer<Velmar::AQtWindow> window)
+{
+    if (!window || !windowLink(window))
+        return;
+    Seen& s = seen()[window];
+    s.scheduled = false;
+    const bool maximized = (window->windowState() & Qt::WindowMaximized) != 0;
+    const QRect now = window->geometry();
+    const bool own = gOwnGeometry > 0
+        || (gOwnChangeEnded.isValid() && gOwnChangeEnded.elapsed() < kPlacementMs);
+    const bool placing = !s.shown.isValid() || s.shown.elapsed() < kPlacementMs;
+    if (!own && window->isVisible()) {
+        if (maximized != s.maximized)
+            queueFrameClick(maximized ? short(inZoomOut) : short(inZoomIn), window);
+        else if (now.size() != s.geometry.size())
+            queueFrameClick(inGrow, window);
+        else if (now.topLeft() != s.geometry.topLeft() && !placing)
+            queueFrameClick(inDrag, window);
+    }
+    record(window, s);
+}
+
 class WindowWatcher : public QObject {
 public:
     bool eventFilter(QObject* watched, QEvent* e) override
@@ -45,23 +92,25 @@ public:
             if (!pending(window, inGoAway))
                 queueFrameClick(inGoAway, window);
             break;
-        case QEvent::WindowStateChange:
-            if (gOwnGeometry == 0) {
-                const auto* change = static_cast<QWindowStateChangeEvent*>(e);
-                if (window->windowState() & Qt::WindowMaximized)
-                    queueFrameClick(inZoomOut, window);
-                else if (change->oldState() & Qt::WindowMaximized)
-                    queueFrameClick(inZoomIn, window);
-            }
-            break;
-        case QEvent::Move:
-        case QEvent::Resize: {
-            const short part = e->type() == QEvent::Move ? short(inDrag) : short(inGrow);
-            if (gOwnGeometry == 0 && window->isVisible() && Velmar::Button()
-                && !pending(window, part))
-                queueFrameClick(part, window);
+        case QEvent::Show: {
+            Seen& s = seen()[window];
+            s.shown.start();
+            record(window, s);
             break;
         }
+        case QEvent::WindowStateChange:
+        case QEvent::Move:
+        case QEvent::Resize: {
+            Seen& s = seen()[window];
+            if (!s.scheduled) {
+                s.scheduled = true;
+                QTimer::singleShot(kSettleMs, this, [w = QPointer<Velmar::AQtWindow>(window)] { decide(w); });
+            }
+            break;
+        }
+        case QEvent::Destroy:
+            seen().erase(window);
+            break;
         default:
             break;
         }
@@ -96,7 +145,11 @@ Point clickPoint(short part, Velmar::AQtWindow* window)
 } // namespace
 
 OwnGeometryChange::OwnGeometryChange() { ++gOwnGeometry; }
-OwnGeometryChange::~OwnGeometryChange() { --gOwnGeometry; }
+OwnGeometryChange::~OwnGeometryChange()
+{
+    if (--gOwnGeometry == 0)
+        gOwnChangeEnded.start();
+}
 
 void watchWindow(Velmar::AQtWindow* window)
 {

@@ -66,6 +66,14 @@ public:
         return m_process.exitStatus() == QProcess::NormalExit;
     }
     const QStringList& seen() const { return m_seen; }
+    // The last line starting with `prefix` printed since line `from`, waiting for one if none.
+    QString since(qsizetype from, const QString& prefix)
+    {
+        for (qsizetype i = m_seen.size() - 1; i >= from; --i)
+            if (m_seen[i].startsWith(prefix))
+                return m_seen[i];
+        return waitFor(prefix);
+    }
 
 private:
     QProcess m_process;
@@ -122,7 +130,7 @@ private Q_SLOTS:
             "bitTst=10", "bitShift=1", "locked=1", "grown=1000000", "oneHandlePerResource=1",
             "strLength=5", "resInfo=1281", "countMenus=3", "indString2=5", "missing=1",
             "homeFile=1", "teLength=13", "teLines=3", "teTextSize=13", "teSel=407",
-            "updateEvent=1", "trapAvailable=1", "gestalt=1", "done=1"};
+            "updateEvent=1", "trapAvailable=1", "gestalt=1", "polygon=265141", "polyPoint2=3040", "done=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))
@@ -161,8 +169,24 @@ private Q_SLOTS:
 
         if (!windowManagerRuns())
             return; // no frames without a window manager
-        // The window manager's close button, at the right of the title bar.
-        click(QPoint(r[2] - 7, r[1] - 13));
+        // A title-bar drag, then the maximise button: mouse-downs after the window manager
+        // acted, in inDrag and inZoomOut.
+        m_x.moveTo(QPoint(r[0] + 100, r[1] - 13));
+        m_x.button(1, true);
+        for (int d = 5; d <= 40; d += 5) {
+            m_x.moveTo(QPoint(r[0] + 100 + d, r[1] - 13 + d));
+            QTest::qWait(20);
+        }
+        m_x.button(1, false);
+        QCOMPARE(p.waitFor(QStringLiteral("part")), QStringLiteral("part 4 1"));
+        const qsizetype beforeZoom = p.seen().size();
+        click(QPoint(r[2] + 40 - 23, r[1] + 40 - 13));
+        QCOMPARE(p.waitFor(QStringLiteral("part")), QStringLiteral("part 8 1"));
+        const QList<int> z = p.numbers(p.since(beforeZoom, QStringLiteral("geometry")));
+        QCOMPARE(z.size(), 4);
+        QVERIFY2(z[2] - z[0] > 360, qPrintable(p.seen().join('\n')));
+        // The close button, at the right of the title bar.
+        click(QPoint(z[2] - 7, z[1] - 13));
         QCOMPARE(p.waitFor(QStringLiteral("close")), QStringLiteral("close 0 0"));
         int code = -1;
         QVERIFY(p.finished(&code));

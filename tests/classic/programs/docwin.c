@@ -9,7 +9,7 @@ static void Report(const char* what, long a, long b)
     fflush(stdout);
 }
 
-static void ReportReady(void)
+static void ReportGeometry(const char* what)
 {
     Rect r = gWindow->portRect;
     Point tl, br;
@@ -17,7 +17,7 @@ static void ReportReady(void)
     SetPt(&br, r.right, r.bottom);
     LocalToGlobal(&tl);
     LocalToGlobal(&br);
-    printf("ready %d %d %d %d\n", tl.h, tl.v, br.h, br.v);
+    printf("%s %d %d %d %d\n", what, tl.h, tl.v, br.h, br.v);
     fflush(stdout);
 }
 
@@ -56,8 +56,7 @@ main()
             MoveTo(10, 20);
             DrawString("\pDocument");
             EndUpdate(w);
-            if (!ready++)
-                ReportReady();
+            ReportGeometry(ready++ ? "geometry" : "ready");
             break;
         case mouseDown:
             part = FindWindow(e.where, &w);

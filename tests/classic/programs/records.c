@@ -68,6 +68,17 @@ int main(void)
     CloseRgn(rgn);
     Show("rgnOvalComplex", (**rgn).rgnSize > 10);
     DisposeRgn(rgn);
+    {
+        PolyHandle poly = OpenPoly();
+        MoveTo(10, 10);
+        LineTo(50, 10);
+        LineTo(30, 40);
+        LineTo(10, 10);
+        ClosePoly();
+        Show("polygon", (**poly).polySize * 10000L + (**poly).polyBBox.right * 100 + (**poly).polyBBox.bottom);
+        Show("polyPoint2", (**poly).polyPoints[2].h * 100 + (**poly).polyPoints[2].v);
+        KillPoly(poly);
+    }
 
     qd.randSeed = 1;
     r1 = Random();
