@@ -62,9 +62,9 @@ struct PortShadow {
 
 struct PortLink {
     ::GrafPtr record = nullptr;
-    Velmar::AQtWindow* window = nullptr;   // a window's port: the window's current port
-    Velmar::GrafPtr ownPort = nullptr;     // any other port
-    PixMap pixMap{};                       // what a colour port's portPixMap shows
+    Velmar::AQtWindow* window = nullptr; // a window's port: the window's current port
+    Velmar::GrafPtr ownPort = nullptr; // any other port
+    PixMap pixMap{}; // what a colour port's portPixMap shows
     PixMap* pixMapMaster = nullptr;
     bool ownsStorage = false;
     bool colour = false;
@@ -96,8 +96,7 @@ void relinkWindowList();
 
 // Runs a drawing call on the current port with the record's fields handed over first and the
 // pen written back afterwards. Does nothing without a current port.
-template <typename Call>
-void drawInPort(Call&& call)
+template <typename Call> void drawInPort(Call&& call)
 {
     PortLink* link = currentLink();
     if (!link)

@@ -4,10 +4,10 @@
 // inMenuBar) and TrackGoAway, DragWindow, TrackBox, GrowWindow and MenuSelect answer them.
 #include "classic/ClassicPrivate.h"
 
-#include <QEvent>
-#include <QWidget>
 #include <QElapsedTimer>
+#include <QEvent>
 #include <QTimer>
+#include <QWidget>
 
 #include <deque>
 
@@ -66,8 +66,8 @@ void decide(QPointer<Velmar::AQtWindow> window)
     s.scheduled = false;
     const bool maximized = (window->windowState() & Qt::WindowMaximized) != 0;
     const QRect now = window->geometry();
-    const bool own = gOwnGeometry > 0
-        || (gOwnChangeEnded.isValid() && gOwnChangeEnded.elapsed() < kPlacementMs);
+    const bool own =
+        gOwnGeometry > 0 || (gOwnChangeEnded.isValid() && gOwnChangeEnded.elapsed() < kPlacementMs);
     const bool placing = !s.shown.isValid() || s.shown.elapsed() < kPlacementMs;
     if (!own && window->isVisible()) {
         if (maximized != s.maximized)
@@ -104,15 +104,13 @@ public:
             Seen& s = seen()[window];
             if (!s.scheduled) {
                 s.scheduled = true;
-                QTimer::singleShot(kSettleMs, this, [w = QPointer<Velmar::AQtWindow>(window)] { decide(w); });
+                QTimer::singleShot(
+                    kSettleMs, this, [w = QPointer<Velmar::AQtWindow>(window)] { decide(w); });
             }
             break;
         }
-        case QEvent::Destroy:
-            seen().erase(window);
-            break;
-        default:
-            break;
+        case QEvent::Destroy: seen().erase(window); break;
+        default: break;
         }
         return false;
     }
@@ -144,7 +142,10 @@ Point clickPoint(short part, Velmar::AQtWindow* window)
 
 } // namespace
 
-OwnGeometryChange::OwnGeometryChange() { ++gOwnGeometry; }
+OwnGeometryChange::OwnGeometryChange()
+{
+    ++gOwnGeometry;
+}
 OwnGeometryChange::~OwnGeometryChange()
 {
     if (--gOwnGeometry == 0)

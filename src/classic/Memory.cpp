@@ -107,26 +107,38 @@ QByteArray handleBytes(Handle h)
 
 StringHandle newStringHandle(ConstStr255Param s)
 {
-    const QByteArray bytes = s ? QByteArray(reinterpret_cast<const char*>(s), s[0] + 1)
-                               : QByteArray(1, '\0');
+    const QByteArray bytes =
+        s ? QByteArray(reinterpret_cast<const char*>(s), s[0] + 1) : QByteArray(1, '\0');
     return reinterpret_cast<StringHandle>(newHandleFrom(bytes));
 }
 
 void markResourceHandle(Handle h, bool resource)
 {
     if (Block* block = isLiveHandle(h) ? handles()[h] : nullptr)
-        block->state = resource ? SignedByte(block->state | kResource)
-                                : SignedByte(block->state & ~kResource);
+        block->state =
+            resource ? SignedByte(block->state | kResource) : SignedByte(block->state & ~kResource);
 }
 
 } // namespace VelmarClassic
 
 using namespace VelmarClassic;
 
-Handle NewHandle(Size byteCount) { return newHandle(byteCount, false); }
-Handle NewHandleClear(Size byteCount) { return newHandle(byteCount, true); }
-Handle NewHandleSys(Size byteCount) { return newHandle(byteCount, false); }
-Handle NewHandleSysClear(Size byteCount) { return newHandle(byteCount, true); }
+Handle NewHandle(Size byteCount)
+{
+    return newHandle(byteCount, false);
+}
+Handle NewHandleClear(Size byteCount)
+{
+    return newHandle(byteCount, true);
+}
+Handle NewHandleSys(Size byteCount)
+{
+    return newHandle(byteCount, false);
+}
+Handle NewHandleSysClear(Size byteCount)
+{
+    return newHandle(byteCount, true);
+}
 
 Handle NewEmptyHandle()
 {
@@ -229,8 +241,14 @@ void HNoPurge(Handle h)
     if (Block* block = blockOf(h, "IsValidHandle(h)"))
         block->state = SignedByte(block->state & ~kPurgeable);
 }
-void HLockHi(Handle h) { HLock(h); }
-void MoveHHi(Handle h) { blockOf(h, "IsValidHandle(h)"); }
+void HLockHi(Handle h)
+{
+    HLock(h);
+}
+void MoveHHi(Handle h)
+{
+    blockOf(h, "IsValidHandle(h)");
+}
 
 SignedByte HGetState(Handle h)
 {
@@ -263,8 +281,14 @@ Ptr NewPtrClear(Size byteCount)
         std::memset(p, 0, size_t(byteCount > 0 ? byteCount : 1));
     return p;
 }
-Ptr NewPtrSys(Size byteCount) { return NewPtr(byteCount); }
-Ptr NewPtrSysClear(Size byteCount) { return NewPtrClear(byteCount); }
+Ptr NewPtrSys(Size byteCount)
+{
+    return NewPtr(byteCount);
+}
+Ptr NewPtrSysClear(Size byteCount)
+{
+    return NewPtrClear(byteCount);
+}
 
 void DisposePtr(Ptr p)
 {
@@ -303,9 +327,15 @@ void BlockMove(const void* src, void* dst, Size byteCount)
     if (src && dst && byteCount > 0)
         std::memmove(dst, src, size_t(byteCount));
 }
-void BlockMoveData(const void* src, void* dst, Size byteCount) { BlockMove(src, dst, byteCount); }
+void BlockMoveData(const void* src, void* dst, Size byteCount)
+{
+    BlockMove(src, dst, byteCount);
+}
 
-OSErr MemError() { return gMemError; }
+OSErr MemError()
+{
+    return gMemError;
+}
 
 OSErr HandToHand(Handle* h)
 {
@@ -358,13 +388,23 @@ OSErr HandAndHand(Handle a, Handle b)
 }
 
 // Memory is plentiful: the figures programs check before large allocations.
-long FreeMem() { return 64L * 1024 * 1024; }
-long MaxBlock() { return 64L * 1024 * 1024; }
+long FreeMem()
+{
+    return 64L * 1024 * 1024;
+}
+long MaxBlock()
+{
+    return 64L * 1024 * 1024;
+}
 Size MaxMem(Size* grow)
 {
     if (grow)
         *grow = 0;
     return 64L * 1024 * 1024;
 }
-Size CompactMem(Size) { return 64L * 1024 * 1024; }
-void PurgeMem(Size) {}
+Size CompactMem(Size)
+{
+    return 64L * 1024 * 1024;
+}
+void PurgeMem(Size)
+{}

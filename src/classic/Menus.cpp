@@ -64,8 +64,8 @@ void setFlag(MenuBlock* block, short item, bool on)
     if (item < 0 || item > 31)
         return;
     const long bit = 1L << item;
-    block->record.enableFlags = on ? (block->record.enableFlags | bit)
-                                   : (block->record.enableFlags & ~bit);
+    block->record.enableFlags =
+        on ? (block->record.enableFlags | bit) : (block->record.enableFlags & ~bit);
 }
 
 // One classic item with its metacharacters: ( disabled, /x command key, !x mark, <x style,
@@ -114,7 +114,8 @@ void appendItem(MenuBlock* block, const QByteArray& text)
     if (key)
         Velmar::SetItemCmd(block->menu, Velmar::UInt16(count), key);
     if (mark)
-        Velmar::SetItemMark(block->menu, Velmar::UInt16(count), Velmar::SInt16(Velmar::UInt8(mark)));
+        Velmar::SetItemMark(
+            block->menu, Velmar::UInt16(count), Velmar::SInt16(Velmar::UInt8(mark)));
     if (style)
         Velmar::SetItemStyle(block->menu, Velmar::UInt16(count), style);
     if (disabled)
@@ -264,9 +265,12 @@ void ClearMenuBar()
         DeleteMenu(id);
 }
 
-void DrawMenuBar() {}
-void InvalMenuBar() {}
-void FlashMenuBar(short) {}
+void DrawMenuBar()
+{}
+void InvalMenuBar()
+{}
+void FlashMenuBar(short)
+{}
 
 Handle GetNewMBar(short menuBarID)
 {
@@ -305,7 +309,8 @@ void SetMenuBar(Handle menuList)
     ClearMenuBar();
     const int count = list.size() >= 2 ? (Velmar::UInt8(list[0]) << 8 | Velmar::UInt8(list[1])) : 0;
     for (int i = 0; i < count && 2 + 2 * i + 1 < list.size(); ++i) {
-        const short id = short(Velmar::UInt8(list[2 + 2 * i]) << 8 | Velmar::UInt8(list[3 + 2 * i]));
+        const short id =
+            short(Velmar::UInt8(list[2 + 2 * i]) << 8 | Velmar::UInt8(list[3 + 2 * i]));
         if (MenuHandle m = GetMHandle(id))
             InsertMenu(m, 0);
     }
@@ -356,8 +361,14 @@ void AppendResMenu(MenuHandle theMenu, ResType theType)
     if (block && theType == 'FONT')
         Velmar::AppendResMenu(block->menu, Velmar::ResType(theType));
 }
-void AddResMenu(MenuHandle theMenu, ResType theType) { AppendResMenu(theMenu, theType); }
-void InsertResMenu(MenuHandle theMenu, ResType theType, short) { AppendResMenu(theMenu, theType); }
+void AddResMenu(MenuHandle theMenu, ResType theType)
+{
+    AppendResMenu(theMenu, theType);
+}
+void InsertResMenu(MenuHandle theMenu, ResType theType, short)
+{
+    AppendResMenu(theMenu, theType);
+}
 
 void GetItem(MenuHandle theMenu, short item, Str255 itemString)
 {
@@ -460,6 +471,13 @@ void HiliteMenu(short menuID)
     Velmar::HiliteMenu(menuID);
 }
 
-short OpenDeskAcc(ConstStr255Param) { return 0; }
-void CloseDeskAcc(short) {}
-Boolean SystemEdit(short) { return false; }
+short OpenDeskAcc(ConstStr255Param)
+{
+    return 0;
+}
+void CloseDeskAcc(short)
+{}
+Boolean SystemEdit(short)
+{
+    return false;
+}

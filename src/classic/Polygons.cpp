@@ -34,8 +34,9 @@ void sync(PolyBlock* b)
     b->master = grown;
     grown->polySize = (unsigned short)std::min(65535, 10 + 4 * n);
     const QRect r = points.boundingRect();
-    grown->polyBBox = n ? Rect{short(r.top()), short(r.left()), short(r.bottom() + 1), short(r.right() + 1)}
-                        : Rect{0, 0, 0, 0};
+    grown->polyBBox = n
+        ? Rect{short(r.top()), short(r.left()), short(r.bottom() + 1), short(r.right() + 1)}
+        : Rect{0, 0, 0, 0};
     for (int i = 0; i < n; ++i)
         grown->polyPoints[i] = Point{short(points[i].y()), short(points[i].x())};
 }
@@ -48,8 +49,7 @@ PolyBlock* blockOf(PolyHandle h)
     return VELMAR_ASSERT(it != polygons().end(), "IsValidPolyHandle(poly)") ? it->second : nullptr;
 }
 
-template <typename Call>
-void draw(PolyHandle h, Call&& call)
+template <typename Call> void draw(PolyHandle h, Call&& call)
 {
     if (PolyBlock* b = blockOf(h))
         drawInPort([&] { call(b->poly); });
@@ -105,10 +105,22 @@ void OffsetPoly(PolyHandle poly, short dh, short dv)
     }
 }
 
-void FramePoly(PolyHandle poly) { draw(poly, [](Velmar::PolyPtr* p) { Velmar::FramePoly(p); }); }
-void PaintPoly(PolyHandle poly) { draw(poly, [](Velmar::PolyPtr* p) { Velmar::PaintPoly(p); }); }
-void ErasePoly(PolyHandle poly) { draw(poly, [](Velmar::PolyPtr* p) { Velmar::ErasePoly(p); }); }
-void InvertPoly(PolyHandle poly) { draw(poly, [](Velmar::PolyPtr* p) { Velmar::InvertPoly(p); }); }
+void FramePoly(PolyHandle poly)
+{
+    draw(poly, [](Velmar::PolyPtr* p) { Velmar::FramePoly(p); });
+}
+void PaintPoly(PolyHandle poly)
+{
+    draw(poly, [](Velmar::PolyPtr* p) { Velmar::PaintPoly(p); });
+}
+void ErasePoly(PolyHandle poly)
+{
+    draw(poly, [](Velmar::PolyPtr* p) { Velmar::ErasePoly(p); });
+}
+void InvertPoly(PolyHandle poly)
+{
+    draw(poly, [](Velmar::PolyPtr* p) { Velmar::InvertPoly(p); });
+}
 
 void FillPoly(PolyHandle poly, const Pattern* pat)
 {

@@ -200,8 +200,8 @@ void pushGeometry(PortLink& link)
     Rect bounds = globals()->screenBits.bounds;
     Rect global = r->portRect;
     Velmar::QDLocalToGlobalRect(port, &global);
-    Velmar::OffsetRect(&bounds, short(r->portRect.left - global.left),
-        short(r->portRect.top - global.top));
+    Velmar::OffsetRect(
+        &bounds, short(r->portRect.left - global.left), short(r->portRect.top - global.top));
     if (link.colour) {
         link.pixMap.bounds = bounds;
         link.pixMap.rowBytes = short(0x8000 | 0x3FFF);

@@ -52,8 +52,8 @@ void syncRegion(::RgnHandle rgn)
     if (b.isEmpty())
         r.rgnBBox = Rect{0, 0, 0, 0};
     else
-        r.rgnBBox = Rect{short(b.top()), short(b.left()), short(b.bottom() + 1),
-            short(b.right() + 1)};
+        r.rgnBBox =
+            Rect{short(b.top()), short(b.left()), short(b.bottom() + 1), short(b.right() + 1)};
     // A rectangle is the bare record; other shapes carry their scan lines after it.
     const int rects = block->region->rectCount();
     r.rgnSize = rects <= 1 ? 10 : (unsigned short)std::min(32000, 10 + rects * 8 + 2);
@@ -75,8 +75,7 @@ using namespace VelmarClassic;
 namespace {
 
 // The library call on the regions, then the records of those it changed.
-template <typename Call>
-void changeRegion(::RgnHandle rgn, const char* call, Call&& change)
+template <typename Call> void changeRegion(::RgnHandle rgn, const char* call, Call&& change)
 {
     if (Velmar::RgnHandle r = libraryRegion(rgn, call)) {
         change(r);
@@ -84,8 +83,7 @@ void changeRegion(::RgnHandle rgn, const char* call, Call&& change)
     }
 }
 
-template <typename Call>
-void drawRegion(::RgnHandle rgn, const char* call, Call&& draw)
+template <typename Call> void drawRegion(::RgnHandle rgn, const char* call, Call&& draw)
 {
     if (Velmar::RgnHandle r = libraryRegion(rgn, call))
         drawInPort([&] { draw(r); });
@@ -164,10 +162,22 @@ void combine(RgnHandle a, RgnHandle b, RgnHandle dst, const char* call, RegionOp
 }
 } // namespace
 
-void SectRgn(RgnHandle a, RgnHandle b, RgnHandle dst) { combine(a, b, dst, "SectRgn", Velmar::SectRgn); }
-void UnionRgn(RgnHandle a, RgnHandle b, RgnHandle dst) { combine(a, b, dst, "UnionRgn", Velmar::UnionRgn); }
-void DiffRgn(RgnHandle a, RgnHandle b, RgnHandle dst) { combine(a, b, dst, "DiffRgn", Velmar::DiffRgn); }
-void XorRgn(RgnHandle a, RgnHandle b, RgnHandle dst) { combine(a, b, dst, "XorRgn", Velmar::XorRgn); }
+void SectRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, "SectRgn", Velmar::SectRgn);
+}
+void UnionRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, "UnionRgn", Velmar::UnionRgn);
+}
+void DiffRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, "DiffRgn", Velmar::DiffRgn);
+}
+void XorRgn(RgnHandle a, RgnHandle b, RgnHandle dst)
+{
+    combine(a, b, dst, "XorRgn", Velmar::XorRgn);
+}
 
 Boolean PtInRgn(Point pt, RgnHandle rgn)
 {
@@ -194,10 +204,22 @@ Boolean EmptyRgn(RgnHandle rgn)
     return r ? Velmar::EmptyRgn(r) : true;
 }
 
-void FrameRgn(RgnHandle rgn) { drawRegion(rgn, "FrameRgn", [](Velmar::RgnHandle r) { Velmar::FrameRgn(r); }); }
-void PaintRgn(RgnHandle rgn) { drawRegion(rgn, "PaintRgn", [](Velmar::RgnHandle r) { Velmar::PaintRgn(r); }); }
-void EraseRgn(RgnHandle rgn) { drawRegion(rgn, "EraseRgn", [](Velmar::RgnHandle r) { Velmar::EraseRgn(r); }); }
-void InvertRgn(RgnHandle rgn) { drawRegion(rgn, "InvertRgn", [](Velmar::RgnHandle r) { Velmar::InvertRgn(r); }); }
+void FrameRgn(RgnHandle rgn)
+{
+    drawRegion(rgn, "FrameRgn", [](Velmar::RgnHandle r) { Velmar::FrameRgn(r); });
+}
+void PaintRgn(RgnHandle rgn)
+{
+    drawRegion(rgn, "PaintRgn", [](Velmar::RgnHandle r) { Velmar::PaintRgn(r); });
+}
+void EraseRgn(RgnHandle rgn)
+{
+    drawRegion(rgn, "EraseRgn", [](Velmar::RgnHandle r) { Velmar::EraseRgn(r); });
+}
+void InvertRgn(RgnHandle rgn)
+{
+    drawRegion(rgn, "InvertRgn", [](Velmar::RgnHandle r) { Velmar::InvertRgn(r); });
+}
 
 void FillRgn(RgnHandle rgn, const Pattern* pat)
 {

@@ -89,8 +89,7 @@ Handle handleFor(OpenFile& file, const ResourceEntry& entry)
     return h;
 }
 
-template <typename Find>
-Handle search(bool onlyCurrent, Find&& find)
+template <typename Find> Handle search(bool onlyCurrent, Find&& find)
 {
     ensureStarted();
     for (OpenFile* file : chain(onlyCurrent))
@@ -207,8 +206,8 @@ short OpenResFile(ConstStr255Param fileName)
     ensureStarted();
     if (!VELMAR_ASSERT(fileName, "fileName != NULL"))
         return -1;
-    const QString name = QString::fromLatin1(toQByteArray(fileName)).replace(QLatin1Char(':'),
-        QLatin1Char('/'));
+    const QString name =
+        QString::fromLatin1(toQByteArray(fileName)).replace(QLatin1Char(':'), QLatin1Char('/'));
     // A name without a folder is looked for where the program is run, then beside the program.
     if (!QFileInfo::exists(name) && QFileInfo(name).isRelative()) {
         const QString beside = QDir(QCoreApplication::applicationDirPath()).filePath(name);
@@ -235,7 +234,8 @@ void CloseResFile(short refNum)
         DisposeHandle(h);
     s.files.erase(s.files.begin() + i);
     if (s.current == refNum)
-        s.current = i > 0 ? s.files[size_t(i - 1)].refNum : (s.files.empty() ? 0 : s.files.back().refNum);
+        s.current =
+            i > 0 ? s.files[size_t(i - 1)].refNum : (s.files.empty() ? 0 : s.files.back().refNum);
     s.error = noErr;
 }
 
@@ -332,11 +332,26 @@ QList<UInt32> allTypes()
 }
 } // namespace
 
-Handle GetIndResource(ResType theType, short index) { return indexed(theType, index, false); }
-Handle Get1IndResource(ResType theType, short index) { return indexed(theType, index, true); }
-short CountResources(ResType theType) { return counted(theType, false); }
-short Count1Resources(ResType theType) { return counted(theType, true); }
-short CountTypes() { return short(allTypes().size()); }
+Handle GetIndResource(ResType theType, short index)
+{
+    return indexed(theType, index, false);
+}
+Handle Get1IndResource(ResType theType, short index)
+{
+    return indexed(theType, index, true);
+}
+short CountResources(ResType theType)
+{
+    return counted(theType, false);
+}
+short Count1Resources(ResType theType)
+{
+    return counted(theType, true);
+}
+short CountTypes()
+{
+    return short(allTypes().size());
+}
 
 void GetIndType(ResType* theType, short index)
 {

@@ -62,8 +62,7 @@ StringHandle NewString(ConstStr255Param theString)
 
 void SetString(StringHandle h, ConstStr255Param theString)
 {
-    if (!VELMAR_ASSERT(isLiveHandle(reinterpret_cast<Handle>(h)), "IsValidHandle(h)")
-        || !theString)
+    if (!VELMAR_ASSERT(isLiveHandle(reinterpret_cast<Handle>(h)), "IsValidHandle(h)") || !theString)
         return;
     SetHandleSize(reinterpret_cast<Handle>(h), theString[0] + 1);
     if (MemError() == noErr)
@@ -107,9 +106,18 @@ void SetCursor(const Cursor* crsr)
     Velmar::SetCCursor(cursor);
 }
 
-void HideCursor() { Velmar::HideCursor(); }
-void ShowCursor() { Velmar::ShowCursor(); }
-void ObscureCursor() { Velmar::ObscureCursor(); }
+void HideCursor()
+{
+    Velmar::HideCursor();
+}
+void ShowCursor()
+{
+    Velmar::ShowCursor();
+}
+void ObscureCursor()
+{
+    Velmar::ObscureCursor();
+}
 
 PatHandle GetPattern(short patternID)
 {

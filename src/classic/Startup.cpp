@@ -71,8 +71,8 @@ void fillScreenBits(QDGlobals& g)
     const QRect r = screen ? screen->geometry() : QRect(0, 0, 640, 480);
     g.screenBits.baseAddr = nullptr;
     g.screenBits.rowBytes = short(((r.width() + 15) / 16) * 2);
-    g.screenBits.bounds = Rect{short(r.top()), short(r.left()), short(r.bottom() + 1),
-        short(r.right() + 1)};
+    g.screenBits.bounds =
+        Rect{short(r.top()), short(r.left()), short(r.bottom() + 1), short(r.right() + 1)};
 }
 
 } // namespace
@@ -117,15 +117,36 @@ void InitGraf(void* globalPtr)
     ensureStarted();
 }
 
-void InitFonts() { ensureStarted(); }
-void InitWindows() { ensureStarted(); }
-void InitMenus() { ensureStarted(); }
-void TEInit() { ensureStarted(); }
-void InitDialogs(void*) { ensureStarted(); }
-void MaxApplZone() {}
-void MoreMasters() {}
-void SetApplLimit(void*) {}
-Ptr GetApplLimit() { return nullptr; }
+void InitFonts()
+{
+    ensureStarted();
+}
+void InitWindows()
+{
+    ensureStarted();
+}
+void InitMenus()
+{
+    ensureStarted();
+}
+void TEInit()
+{
+    ensureStarted();
+}
+void InitDialogs(void*)
+{
+    ensureStarted();
+}
+void MaxApplZone()
+{}
+void MoreMasters()
+{}
+void SetApplLimit(void*)
+{}
+Ptr GetApplLimit()
+{
+    return nullptr;
+}
 
 void ExitToShell()
 {

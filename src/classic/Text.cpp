@@ -9,8 +9,7 @@ using namespace VelmarClassic;
 
 namespace {
 
-template <typename Call>
-void drawText(Call&& call)
+template <typename Call> void drawText(Call&& call)
 {
     PortLink* link = currentLink();
     if (!link)
@@ -30,8 +29,7 @@ void drawText(Call&& call)
     pushPen(*link);
 }
 
-template <typename Call>
-short measure(Call&& call)
+template <typename Call> short measure(Call&& call)
 {
     PortLink* link = currentLink();
     if (!link)
@@ -74,7 +72,10 @@ void TextSize(short size)
     }
 }
 
-void DrawChar(CharParameter ch) { drawText([&] { Velmar::DrawChar(ch); }); }
+void DrawChar(CharParameter ch)
+{
+    drawText([&] { Velmar::DrawChar(ch); });
+}
 
 void DrawString(ConstStr255Param s)
 {
@@ -143,4 +144,5 @@ Boolean RealFont(short, short size)
     return size > 0;
 }
 
-void SetFScaleDisable(Boolean) {}
+void SetFScaleDisable(Boolean)
+{}

@@ -100,8 +100,7 @@ void push(TEBlock* b)
 }
 
 // The library call between handing the record's fields over and writing them back.
-template <typename Call>
-void edit(TEHandle h, Call&& call)
+template <typename Call> void edit(TEHandle h, Call&& call)
 {
     TEBlock* b = blockOf(h);
     if (!b)
@@ -119,8 +118,8 @@ TEHandle make(const Rect* destRect, const Rect* viewRect, bool styled)
     PortLink* link = currentLink();
     if (!link)
         return nullptr;
-    Velmar::TEPtr* te = styled ? Velmar::TEStyleNew(destRect, viewRect)
-                               : Velmar::TENew(destRect, viewRect);
+    Velmar::TEPtr* te =
+        styled ? Velmar::TEStyleNew(destRect, viewRect) : Velmar::TENew(destRect, viewRect);
     if (!te)
         return nullptr;
     auto* b = new TEBlock;
@@ -137,8 +136,14 @@ TEHandle make(const Rect* destRect, const Rect* viewRect, bool styled)
 
 } // namespace
 
-TEHandle TENew(const Rect* destRect, const Rect* viewRect) { return make(destRect, viewRect, false); }
-TEHandle TEStyleNew(const Rect* destRect, const Rect* viewRect) { return make(destRect, viewRect, true); }
+TEHandle TENew(const Rect* destRect, const Rect* viewRect)
+{
+    return make(destRect, viewRect, false);
+}
+TEHandle TEStyleNew(const Rect* destRect, const Rect* viewRect)
+{
+    return make(destRect, viewRect, true);
+}
 
 void TEDispose(TEHandle hTE)
 {
@@ -168,7 +173,10 @@ Handle TEGetText(TEHandle hTE)
     return b->text;
 }
 
-void TEIdle(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEIdle(te); }); }
+void TEIdle(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEIdle(te); });
+}
 
 void TEClick(Point pt, Boolean fExtend, TEHandle h)
 {
@@ -183,18 +191,36 @@ void TESetSelect(long selStart, long selEnd, TEHandle hTE)
     });
 }
 
-void TEActivate(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEActivate(te); }); }
-void TEDeactivate(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDeactivate(te); }); }
+void TEActivate(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEActivate(te); });
+}
+void TEDeactivate(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDeactivate(te); });
+}
 
 void TEKey(CharParameter key, TEHandle hTE)
 {
     edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEKey(char(key), te, lastLibraryEvent()); });
 }
 
-void TECut(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECut(te); }); }
-void TECopy(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECopy(te); }); }
-void TEPaste(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEPaste(te); }); }
-void TEDelete(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDelete(te); }); }
+void TECut(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECut(te); });
+}
+void TECopy(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECopy(te); });
+}
+void TEPaste(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEPaste(te); });
+}
+void TEDelete(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDelete(te); });
+}
 
 void TEInsert(const void* text, long length, TEHandle hTE)
 {
@@ -226,14 +252,20 @@ void TEScroll(short dh, short dv, TEHandle hTE)
     edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEScroll(dh, dv, te); });
 }
 
-void TESelView(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TESelView(te); }); }
+void TESelView(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TESelView(te); });
+}
 
 void TEAutoView(Boolean fAuto, TEHandle hTE)
 {
     edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEAutoView(fAuto, te); });
 }
 
-void TECalText(TEHandle hTE) { edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECalText(te); }); }
+void TECalText(TEHandle hTE)
+{
+    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECalText(te); });
+}
 
 short TEGetOffset(Point pt, TEHandle hTE)
 {

@@ -7,7 +7,6 @@
 #include <QLocale>
 #include <QTime>
 
-
 #include <cstring>
 
 namespace {
@@ -31,12 +30,30 @@ void toPascal(const QString& text, Str255 out)
 
 } // namespace
 
-short HiWord(long x) { return short((x >> 16) & 0xFFFF); }
-short LoWord(long x) { return short(x & 0xFFFF); }
-long BitAnd(long a, long b) { return long(int(a & b)); }
-long BitOr(long a, long b) { return long(int(a | b)); }
-long BitXor(long a, long b) { return long(int(a ^ b)); }
-long BitNot(long a) { return long(int(~a)); }
+short HiWord(long x)
+{
+    return short((x >> 16) & 0xFFFF);
+}
+short LoWord(long x)
+{
+    return short(x & 0xFFFF);
+}
+long BitAnd(long a, long b)
+{
+    return long(int(a & b));
+}
+long BitOr(long a, long b)
+{
+    return long(int(a | b));
+}
+long BitXor(long a, long b)
+{
+    return long(int(a ^ b));
+}
+long BitNot(long a)
+{
+    return long(int(~a));
+}
 
 long BitShift(long value, short count)
 {
@@ -145,8 +162,9 @@ void IUTimeString(unsigned long dateTime, Boolean wantSeconds, Str255 result)
     if (!VELMAR_ASSERT(result, "result != NULL"))
         return;
     const QTime time = fromSeconds(dateTime).time();
-    toPascal(QLocale::c().toString(time, wantSeconds ? QStringLiteral("h:mm:ss AP")
-                                                      : QStringLiteral("h:mm AP")), result);
+    toPascal(QLocale::c().toString(
+                 time, wantSeconds ? QStringLiteral("h:mm:ss AP") : QStringLiteral("h:mm AP")),
+        result);
 }
 
 void NumToString(long theNum, Str255 theString)
@@ -281,8 +299,14 @@ void SysBeep(short duration)
     Velmar::SysBeep(duration);
 }
 
-void Debugger() { Velmar::Debugger(); }
-void DebugStr(ConstStr255Param message) { Velmar::DebugStr(message); }
+void Debugger()
+{
+    Velmar::Debugger();
+}
+void DebugStr(ConstStr255Param message)
+{
+    Velmar::DebugStr(message);
+}
 
 // ---- Trap addresses ------------------------------------------------------------------------
 // Every trap a program asks about exists, except the one that stands for none.
@@ -297,6 +321,15 @@ UniversalProcPtr NGetTrapAddress(unsigned short trapNum, TrapType)
 {
     return reinterpret_cast<UniversalProcPtr>(trapAddress(trapNum));
 }
-UniversalProcPtr GetToolTrapAddress(unsigned short trapNum) { return NGetTrapAddress(trapNum, ToolTrap); }
-UniversalProcPtr GetOSTrapAddress(unsigned short trapNum) { return NGetTrapAddress(trapNum, OSTrap); }
-UniversalProcPtr GetTrapAddress(unsigned short trapNum) { return NGetTrapAddress(trapNum, ToolTrap); }
+UniversalProcPtr GetToolTrapAddress(unsigned short trapNum)
+{
+    return NGetTrapAddress(trapNum, ToolTrap);
+}
+UniversalProcPtr GetOSTrapAddress(unsigned short trapNum)
+{
+    return NGetTrapAddress(trapNum, OSTrap);
+}
+UniversalProcPtr GetTrapAddress(unsigned short trapNum)
+{
+    return NGetTrapAddress(trapNum, ToolTrap);
+}

@@ -35,8 +35,8 @@ WindowPtr makeWindow(void* storage, const Rect* bounds, ConstStr255Param title, 
     Velmar::WindowRef window;
     {
         OwnGeometryChange own;
-        window = Velmar::NewCWindow(nullptr, bounds, title ? title : empty, false, procID,
-            nullptr, goAwayFlag, nullptr);
+        window = Velmar::NewCWindow(
+            nullptr, bounds, title ? title : empty, false, procID, nullptr, goAwayFlag, nullptr);
     }
     if (!window)
         return nullptr;
@@ -140,8 +140,8 @@ void dispose(WindowPtr window, bool freeStorage)
 
 } // namespace
 
-WindowPtr NewWindow(void* wStorage, const Rect* boundsRect, ConstStr255Param title,
-    Boolean visible, short procID, WindowPtr, Boolean goAwayFlag, long refCon)
+WindowPtr NewWindow(void* wStorage, const Rect* boundsRect, ConstStr255Param title, Boolean visible,
+    short procID, WindowPtr, Boolean goAwayFlag, long refCon)
 {
     return makeWindow(wStorage, boundsRect, title, visible, procID, goAwayFlag, refCon, false);
 }
@@ -162,8 +162,8 @@ WindowPtr fromTemplate(short windowID, void* wStorage, bool colour)
         return nullptr;
     Str255 title;
     copyToStr255(t->title, title);
-    return makeWindow(wStorage, &t->bounds, title, t->visible, t->procID, t->goAwayFlag,
-        long(t->refCon), colour);
+    return makeWindow(
+        wStorage, &t->bounds, title, t->visible, t->procID, t->goAwayFlag, long(t->refCon), colour);
 }
 } // namespace
 
@@ -177,8 +177,14 @@ WindowPtr GetNewCWindow(short windowID, void* wStorage, WindowPtr)
     return fromTemplate(windowID, wStorage, true);
 }
 
-void CloseWindow(WindowPtr window) { dispose(window, false); }
-void DisposeWindow(WindowPtr window) { dispose(window, true); }
+void CloseWindow(WindowPtr window)
+{
+    dispose(window, false);
+}
+void DisposeWindow(WindowPtr window)
+{
+    dispose(window, true);
+}
 
 void ShowWindow(WindowPtr window)
 {
@@ -310,8 +316,10 @@ long GrowWindow(WindowPtr window, Point startPt, const Rect* sizeRect)
         Velmar::GetWindowBounds(link->window, Velmar::kWindowContentRgn, &content);
         long width = content.right - content.left, height = content.bottom - content.top;
         if (sizeRect) {
-            width = std::clamp<long>(width, sizeRect->left, std::max(sizeRect->left, sizeRect->right));
-            height = std::clamp<long>(height, sizeRect->top, std::max(sizeRect->top, sizeRect->bottom));
+            width =
+                std::clamp<long>(width, sizeRect->left, std::max(sizeRect->left, sizeRect->right));
+            height =
+                std::clamp<long>(height, sizeRect->top, std::max(sizeRect->top, sizeRect->bottom));
         }
         return (height << 16) | (width & 0xFFFF);
     }
@@ -417,7 +425,8 @@ PortLink* currentWindowLink(const char* call)
     ensureStarted();
     PortLink* link = currentLink();
     if (!link || !link->window) {
-        Velmar::VelmarLog(Velmar::kLogWindowManagement, "warning: %s: the current port is no window", call);
+        Velmar::VelmarLog(
+            Velmar::kLogWindowManagement, "warning: %s: the current port is no window", call);
         return nullptr;
     }
     return link;
@@ -510,7 +519,8 @@ void DrawGrowIcon(WindowPtr window)
     win(window, "DrawGrowIcon");
 }
 
-void SystemClick(const EventRecord*, WindowPtr) {}
+void SystemClick(const EventRecord*, WindowPtr)
+{}
 
 CGrafPtr GetWindowPort(WindowPtr window)
 {

@@ -99,7 +99,8 @@ double darkShare(const QImage& image, const QRect& area)
 bool windowManagerRuns()
 {
     QProcess xprop;
-    xprop.start(QStringLiteral("xprop"), {QStringLiteral("-root"), QStringLiteral("_NET_SUPPORTING_WM_CHECK")});
+    xprop.start(QStringLiteral("xprop"),
+        {QStringLiteral("-root"), QStringLiteral("_NET_SUPPORTING_WM_CHECK")});
     return xprop.waitForFinished(3000) && xprop.readAll().contains("window id");
 }
 
@@ -121,22 +122,22 @@ private Q_SLOTS:
         QVERIFY2(!p.waitFor(QStringLiteral("done=")).isEmpty(), qPrintable(p.seen().join('\n')));
         // What a classic program reads straight from the records and globals.
         const QStringList expected = {"black0=255", "gray01=43605", "screenPositive=1",
-            "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1",
-            "windowKind=8", "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7",
-            "secondBehindFirst=1", "contRgnWidth=300", "GetWRefCon=99",
-            "pnLocAfterMove=35045", "txSize=18", "rgnRect=1011070", "rgnOvalComplex=1",
-            "random1=16807", "seedAfter=16807", "randomPlainGlobal=1", "dateRoundTrip=1",
-            "epoch=19040101", "shortDateLength=6", "stringToNum=-1234567", "hiword=4660",
-            "bitTst=10", "bitShift=1", "locked=1", "grown=1000000", "oneHandlePerResource=1",
-            "strLength=5", "resInfo=1281", "countMenus=3", "indString2=5", "missing=1",
-            "homeFile=1", "teLength=13", "teLines=3", "teTextSize=13", "teSel=407",
-            "updateEvent=1", "trapAvailable=1", "gestalt=1", "polygon=265141", "polyPoint2=3040", "done=1"};
+            "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1", "windowKind=8",
+            "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7", "secondBehindFirst=1",
+            "contRgnWidth=300", "GetWRefCon=99", "pnLocAfterMove=35045", "txSize=18",
+            "rgnRect=1011070", "rgnOvalComplex=1", "random1=16807", "seedAfter=16807",
+            "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101", "shortDateLength=6",
+            "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1", "locked=1",
+            "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
+            "countMenus=3", "indString2=5", "missing=1", "homeFile=1", "teLength=13", "teLines=3",
+            "teTextSize=13", "teSel=407", "updateEvent=1", "trapAvailable=1", "gestalt=1",
+            "polygon=265141", "polyPoint2=3040", "done=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))
                 missing << line;
-        QVERIFY2(missing.isEmpty(), qPrintable("missing: " + missing.join(' ') + "\nseen: "
-            + p.seen().join(' ')));
+        QVERIFY2(missing.isEmpty(),
+            qPrintable("missing: " + missing.join(' ') + "\nseen: " + p.seen().join(' ')));
         int code = -1;
         QVERIFY(p.finished(&code));
         QCOMPARE(code, 0);
@@ -242,7 +243,9 @@ private Q_SLOTS:
         QTest::qWait(1000);
         m_x.moveTo(QPoint(200, 150));
         m_x.tap(kKeyQ);
-        const QList<int> n = p.numbers(p.waitFor(QStringLiteral("key")).remove(QStringLiteral("frames ")).remove(QStringLiteral("ticks ")));
+        const QList<int> n = p.numbers(p.waitFor(QStringLiteral("key"))
+                                           .remove(QStringLiteral("frames "))
+                                           .remove(QStringLiteral("ticks ")));
         QCOMPARE(n.size(), 3);
         // A frame for most ticks: the loop never slept.
         QVERIFY2(n[2] >= 40 && n[1] >= n[2] / 2, qPrintable(p.seen().join('\n')));

@@ -62,10 +62,10 @@ bool build(const QList<const char*>& a, Classic::ResourceEntry* e)
         e->type = 'WIND';
         for (int i = 3; i <= 6; ++i)
             word(d, atoi(a[i]));
-        word(d, atoi(a[7]));     // procID
+        word(d, atoi(a[7])); // procID
         word(d, atoi(a[8]) ? 0x0100 : 0); // visible (a Boolean in the high byte)
         word(d, atoi(a[9]) ? 0x0100 : 0); // goAwayFlag
-        d.append(QByteArray(4, '\0'));    // refCon
+        d.append(QByteArray(4, '\0')); // refCon
         pascal(d, latin1(a[2]));
     } else if (type == "MENU" && a.size() >= 3) {
         e->type = 'MENU';
@@ -91,13 +91,17 @@ bool build(const QList<const char*>& a, Classic::ResourceEntry* e)
             pascal(items, text);
             items.append('\0').append(key).append('\0').append('\0');
         }
-        d.append(char(enable >> 24)).append(char(enable >> 16)).append(char(enable >> 8)).append(char(enable));
+        d.append(char(enable >> 24))
+            .append(char(enable >> 16))
+            .append(char(enable >> 8))
+            .append(char(enable));
         const QByteArray title = latin1(a[2]);
         pascal(d, title == "@" ? QByteArray(1, '\x14') : title);
         d.append(items).append('\0');
     } else if (type == "HEX" && a.size() == 4 && qstrlen(a[1]) == 4) {
         const QByteArray t = a[1];
-        e->type = UInt32(UInt8(t[0])) << 24 | UInt32(UInt8(t[1])) << 16 | UInt32(UInt8(t[2])) << 8 | UInt8(t[3]);
+        e->type = UInt32(UInt8(t[0])) << 24 | UInt32(UInt8(t[1])) << 16 | UInt32(UInt8(t[2])) << 8
+            | UInt8(t[3]);
         e->id = SInt16(atoi(a[2]));
         d = QByteArray::fromHex(a[3]);
     } else {
@@ -111,7 +115,8 @@ bool build(const QList<const char*>& a, Classic::ResourceEntry* e)
 int main(int argc, char** argv)
 {
     if (argc < 3) {
-        std::fprintf(stderr, "usage: velmar-classic-mkres OUT.rsrc TYPE ID FIELDS... [-- TYPE ID FIELDS...]\n");
+        std::fprintf(stderr,
+            "usage: velmar-classic-mkres OUT.rsrc TYPE ID FIELDS... [-- TYPE ID FIELDS...]\n");
         return 2;
     }
     Classic::ResourceFork fork;
