@@ -3,12 +3,17 @@
 #pragma once
 
 #include <Velmar/MacTypes.h>
+#include <Velmar/QDTypes.h>
 
 #include <QByteArray>
 #include <QImage>
 #include <QString>
 
 namespace Velmar::Classic {
+
+// A classic pattern (eight rows, most significant bit leftmost, set bits in the pen colour)
+// as the library's Pattern, which PenPat, BackPat and FillRect take.
+Pattern classicPattern(const UInt8 (&bits)[8]);
 
 // The frame the picture was recorded in; an empty rectangle when the data is too short.
 Rect pictureFrame(const QByteArray& pict);

@@ -160,11 +160,19 @@ bool parseInto(const QByteArray& fork, QList<ResourceEntry>& out, QString* error
     return true;
 }
 
-std::optional<QByteArray> readFile(const QString& path)
+// A fork's data and map offsets are 32 bits and its data offsets 24: no file that holds one
+// needs more than this.
+constexpr qint64 kMaxFileSize = qint64(1) << 30;
+
+std::optional<QByteArray> readFile(const QString& path, QString* why)
 {
     QFile file(path);
     if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly))
         return std::nullopt;
+    if (file.size() > kMaxFileSize) {
+        *why = QStringLiteral("file too large for a resource file (%1 bytes)").arg(file.size());
+        return QByteArray();
+    }
     return file.readAll();
 }
 
@@ -226,10 +234,14 @@ std::optional<ResourceFork> ResourceFork::load(const QString& path, QString* err
         path + QStringLiteral("/..namedfork/rsrc"),
     };
     for (const QString& candidate : companions) {
-        const auto bytes = readFile(candidate);
+        QString why;
+        const auto bytes = readFile(candidate, &why);
         if (!bytes)
             continue;
-        QString why;
+        if (!why.isEmpty()) {
+            reasons.append(QStringLiteral("%1: %2").arg(candidate, why));
+            continue;
+        }
         if (auto fork = unwrap(*bytes, &why))
             return fork;
         reasons.append(QStringLiteral("%1: %2").arg(candidate, why));
