@@ -131,7 +131,7 @@ private Q_SLOTS:
             "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
             "countMenus=3", "indString2=5", "missing=1", "homeFile=1", "teLength=13", "teLines=3",
             "teTextSize=13", "teSel=407", "updateEvent=1", "trapAvailable=1", "gestalt=1",
-            "polygon=265141", "polyPoint2=3040", "done=1"};
+            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35", "polyPoint2=3040", "done=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))

@@ -133,6 +133,18 @@ int main(void)
     TESetSelect(4, 7, te);
     Show("teSel", (**te).selStart * 100 + (**te).selEnd);
     TEDispose(te);
+    {
+        PicHandle pic = GetPicture(128);
+        CursHandle cursor = GetCursor(128);
+        Rect frame = (**pic).picFrame;
+        Show("pictFrame", frame.right * 100 + frame.bottom);
+        EraseRect(&w->portRect);
+        DrawPicture(pic, &frame);
+        Show("pictDrawn", GetPixel(10, 10) * 10 + GetPixel(2, 2));
+        Show("cursorHotSpot", (**cursor).hotSpot.v * 10 + (**cursor).hotSpot.h);
+        SetCursor(*cursor);
+        SetCursor(&qd.arrow);
+    }
 
     InvalRect(&w->portRect);
     Show("updateEvent", WaitNextEvent(updateMask, &e, 60, 0L) && e.what == updateEvt
