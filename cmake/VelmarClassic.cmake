@@ -57,6 +57,12 @@ function(velmar_add_classic_executable name)
     set_source_files_properties(${ARG_RESOURCES} PROPERTIES HEADER_FILE_ONLY ON)
   endif()
   target_link_libraries(${name} PRIVATE Velmar::Classic)
+  # Linked by the C++ compiler: the libraries are C++, and a sanitized build's runtime is
+  # the C++ compiler's, whichever compiler made the C objects.
+  get_property(languages GLOBAL PROPERTY ENABLED_LANGUAGES)
+  if("CXX" IN_LIST languages)
+    set_target_properties(${name} PROPERTIES LINKER_LANGUAGE CXX)
+  endif()
   set(options -std=gnu99 -Wno-implicit-int -Wno-implicit-function-declaration
     -Wno-return-type -Wno-multichar -Wno-int-conversion -Wno-pointer-sign
     -Wno-incompatible-pointer-types -Wno-deprecated-declarations)
