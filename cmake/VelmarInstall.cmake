@@ -30,4 +30,20 @@ string(REGEX REPLACE "/$" "" VELMAR_PC_TO_PREFIX "${VELMAR_PC_TO_PREFIX}")
 configure_file(${PROJECT_SOURCE_DIR}/cmake/velmar.pc.in ${PROJECT_BINARY_DIR}/velmar.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/velmar.pc DESTINATION ${VELMAR_PC_DIR} COMPONENT dev)
 
+# The classic C interface: its library, its headers in a folder of their own (only classic
+# programs put it on their path), the build function and a pkg-config file.
+install(TARGETS velmar-classic EXPORT VelmarTargets
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT runtime NAMELINK_COMPONENT dev
+  ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT dev
+  RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT runtime)
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/classic/
+  DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/velmar-classic COMPONENT dev
+  FILES_MATCHING PATTERN "*.h")
+install(FILES ${PROJECT_SOURCE_DIR}/cmake/VelmarClassic.cmake DESTINATION ${VELMAR_CMAKE_DIR}
+  COMPONENT dev)
+install(TARGETS velmar-classic-mkres RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT dev)
+configure_file(${PROJECT_SOURCE_DIR}/cmake/velmar-classic.pc.in
+  ${PROJECT_BINARY_DIR}/velmar-classic.pc @ONLY)
+install(FILES ${PROJECT_BINARY_DIR}/velmar-classic.pc DESTINATION ${VELMAR_PC_DIR} COMPONENT dev)
+
 include(${PROJECT_SOURCE_DIR}/cmake/VelmarPackaging.cmake)

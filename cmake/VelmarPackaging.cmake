@@ -19,6 +19,8 @@ set(CPACK_STRIP_FILES ON) # the debugging information stays in the build tree
 
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_NAME ${VELMAR_DEB_RUNTIME})
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_SHLIBDEPS ON)
+# The classic library needs the main one, which is in this package too.
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR}/src)
 # The platform plugins: X11 (xcb) and Wayland desktops.
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_RECOMMENDS "qt6-qpa-plugins, qt6-wayland")
 set(CPACK_COMPONENT_RUNTIME_DESCRIPTION

@@ -1,0 +1,2 @@
+/* Gestalt lives in OSUtils.h here. */
+#include "OSUtils.h"

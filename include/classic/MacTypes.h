@@ -1,0 +1,2 @@
+/* The same as Types.h, under the later name. */
+#include "Types.h"

@@ -1,0 +1,2 @@
+/* The international utilities and number conversion lived here once. */
+#include "TextUtils.h"

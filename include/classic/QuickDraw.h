@@ -1,0 +1,2 @@
+/* The same as Quickdraw.h. */
+#include "Quickdraw.h"

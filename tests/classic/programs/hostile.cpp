@@ -1,0 +1,193 @@
+// Classic calls given null, made-up, disposed and extreme arguments: each is refused with the
+// library's assertion (answered Ignore here) and its neutral result, and nothing crashes.
+// Linked like a classic program (the shared libraries), not the static twin.
+#include <Velmar/HostCore.h>
+
+#define VELMAR_CLASSIC_SHARES_RECT 1
+#include <ClassicToolbox.h>
+
+#include <QTest>
+
+#include <climits>
+#include <functional>
+
+namespace {
+
+class Recorder : public Velmar::AutomationListener {
+public:
+    QString AnswerDialog(const QString&, const QString& text, const QString&) override
+    {
+        texts << text.section(QStringLiteral("velmar_assert: "), 1).section(u'\n', 0, 0);
+        return QStringLiteral("Ignore");
+    }
+    QStringList texts;
+};
+
+struct Case {
+    const char* name;
+    std::function<long()> call;
+    long result;
+    const char* assertion; // empty: none expected
+};
+
+} // namespace
+
+class tst_ClassicHostile : public QObject {
+    Q_OBJECT
+
+private Q_SLOTS:
+    void initTestCase()
+    {
+        InitGraf(&qd.thePort);
+        InitWindows();
+        Velmar::AutomationListenerManager::SetListener(&m_recorder);
+    }
+
+    void refused()
+    {
+        static char junk[64];
+        auto* madeUp = reinterpret_cast<Handle>(junk);
+        RgnHandle gone = NewRgn();
+        DisposeRgn(gone);
+        Handle goneHandle = NewHandle(4);
+        DisposeHandle(goneHandle);
+        Rect bounds = {40, 40, 140, 240};
+        WindowPtr goneWindow = NewWindow(
+            nullptr, &bounds, (const unsigned char*)"\1w", false, 0, (WindowPtr)-1L, true, 0);
+        DisposeWindow(goneWindow);
+        const Case cases[] = {
+            {"DisposeRgn made-up",
+                [&] {
+                    DisposeRgn(reinterpret_cast<RgnHandle>(junk));
+                    return 0L;
+                },
+                0, "IsValidRgnHandle(rgn)"},
+            {"DisposeRgn disposed",
+                [&] {
+                    DisposeRgn(gone);
+                    return 0L;
+                },
+                0, "IsValidRgnHandle(rgn)"},
+            {"EmptyRgn null", [] { return long(EmptyRgn(nullptr)); }, 1, "rgn != NULL"},
+            {"SetPort made-up",
+                [&] {
+                    SetPort(reinterpret_cast<GrafPtr>(junk));
+                    return 0L;
+                },
+                0, "IsValidPort(port)"},
+            {"SetPort disposed window",
+                [&] {
+                    SetPort(goneWindow);
+                    return 0L;
+                },
+                0, "IsValidPort(port)"},
+            {"DisposeWindow disposed",
+                [&] {
+                    DisposeWindow(goneWindow);
+                    return 0L;
+                },
+                0, "IsValidWindowPtr(window)"},
+            {"FindWindow null out",
+                [] {
+                    return long(FindWindow(Point{1, 1}, nullptr));
+                },
+                inDesk, "theWindow != NULL"},
+            {"DisposeHandle made-up",
+                [&] {
+                    DisposeHandle(madeUp);
+                    return long(MemError());
+                },
+                nilHandleErr, "IsValidHandle(h)"},
+            {"GetHandleSize disposed", [&] { return long(GetHandleSize(goneHandle)); }, 0,
+                "IsValidHandle(h)"},
+            {"HLock null",
+                [] {
+                    HLock(nullptr);
+                    return long(MemError());
+                },
+                nilHandleErr, ""},
+            {"NewHandle negative",
+                [] { return long(NewHandle(-1) == nullptr) * 1000 + MemError(); },
+                1000 + memFullErr, ""},
+            {"SetHandleSize huge",
+                [] {
+                    Handle h = NewHandle(1);
+                    SetHandleSize(h, LONG_MAX);
+                    const long e = MemError();
+                    DisposeHandle(h);
+                    return e;
+                },
+                memFullErr, ""},
+            {"DrawPicture made-up",
+                [&] {
+                    DrawPicture(reinterpret_cast<PicHandle>(junk), &bounds);
+                    return 0L;
+                },
+                0, "IsValidHandle(myPicture)"},
+            {"TEDispose made-up",
+                [&] {
+                    TEDispose(reinterpret_cast<TEHandle>(junk));
+                    return 0L;
+                },
+                0, "IsValidTEHandle(hTE)"},
+            {"CheckItem made-up",
+                [&] {
+                    CheckItem(reinterpret_cast<MenuHandle>(junk), 1, true);
+                    return 0L;
+                },
+                0, "IsValidMenu(theMenu)"},
+            {"GetResInfo plain handle",
+                [] {
+                    Handle h = NewHandle(2);
+                    short id = 7;
+                    GetResInfo(h, &id, nullptr, nullptr);
+                    DisposeHandle(h);
+                    return long(ResError()) * 10 + id;
+                },
+                resNotFound * 10 + 7, ""},
+            {"OpenResFile missing",
+                [] { return OpenResFile((const unsigned char*)"\7nothing") * 1000L + ResError(); },
+                -1000 + fnfErr, ""},
+            {"CloseResFile unknown",
+                [] {
+                    CloseResFile(999);
+                    return long(ResError());
+                },
+                resFNotFound, ""},
+            {"GetIndString past end",
+                [] {
+                    Str255 s = {3, 'a', 'b', 'c'};
+                    GetIndString(s, 128, 99);
+                    return long(s[0]);
+                },
+                0, ""},
+            {"BitShift far", [] { return BitShift(1, 40); }, 256, ""},
+            {"Random from seed 0",
+                [] {
+                    qd.randSeed = 0;
+                    return Random();
+                },
+                16807, ""},
+            {"DrawString without port",
+                [] {
+                    DrawString((const unsigned char*)"\1x");
+                    return 0L;
+                },
+                0, ""},
+        };
+        for (const Case& c : cases) {
+            m_recorder.texts.clear();
+            QCOMPARE_EQ(c.call(), c.result);
+            const QStringList expected = *c.assertion ? QStringList{c.assertion} : QStringList{};
+            QVERIFY2(m_recorder.texts == expected,
+                qPrintable(QStringLiteral("%1: %2").arg(
+                    QLatin1String(c.name), m_recorder.texts.join(u'|'))));
+        }
+    }
+
+private:
+    Recorder m_recorder;
+};
+
+QTEST_APPLESS_MAIN(tst_ClassicHostile)
+#include "hostile.moc"

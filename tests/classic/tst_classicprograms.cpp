@@ -1,0 +1,268 @@
+// Classic C programs of our own (tests/classic/programs), built unchanged against the classic
+// headers, run each in a child process on this test's display and driven with real X input.
+// Each prints what its events became; the test checks that and the pixels on the screen.
+#include "TestSupport.h"
+#include "XTestInput.h"
+
+#include <QElapsedTimer>
+#include <QGuiApplication>
+#include <QImage>
+#include <QProcess>
+#include <QScreen>
+#include <QTest>
+
+#include <memory>
+
+namespace {
+
+// Keysyms used below.
+constexpr unsigned long kKeyQ = 0x71, kKeyN = 0x6e, kControl = 0xffe3;
+
+class Program {
+public:
+    explicit Program(const QString& name)
+    {
+        m_process.setProgram(QStringLiteral(CLASSIC_PROGRAM_DIR "/classic_") + name);
+        m_process.setProcessChannelMode(QProcess::ForwardedErrorChannel);
+        m_process.start();
+    }
+    ~Program()
+    {
+        if (m_process.state() != QProcess::NotRunning) {
+            m_process.kill();
+            m_process.waitForFinished(3000);
+        }
+    }
+    // The next line the program prints that starts with `prefix`; empty after 10 s.
+    QString waitFor(const QString& prefix)
+    {
+        QElapsedTimer clock;
+        clock.start();
+        while (clock.elapsed() < 10000) {
+            while (m_process.canReadLine()) {
+                const QString line = QString::fromLatin1(m_process.readLine()).trimmed();
+                m_seen << line;
+                if (line.startsWith(prefix))
+                    return line;
+            }
+            if (!m_process.waitForReadyRead(100) && m_process.state() == QProcess::NotRunning
+                && !m_process.canReadLine())
+                break;
+        }
+        return QString();
+    }
+    QList<int> numbers(const QString& line) const
+    {
+        QList<int> result;
+        for (const QString& word : line.split(QLatin1Char(' ')).mid(1))
+            result << word.toInt();
+        return result;
+    }
+    bool finished(int* code)
+    {
+        if (!m_process.waitForFinished(10000))
+            return false;
+        *code = m_process.exitCode();
+        return m_process.exitStatus() == QProcess::NormalExit;
+    }
+    const QStringList& seen() const { return m_seen; }
+    // The last line starting with `prefix` printed since line `from`, waiting for one if none.
+    QString since(qsizetype from, const QString& prefix)
+    {
+        for (qsizetype i = m_seen.size() - 1; i >= from; --i)
+            if (m_seen[i].startsWith(prefix))
+                return m_seen[i];
+        return waitFor(prefix);
+    }
+
+private:
+    QProcess m_process;
+    QStringList m_seen;
+};
+
+QImage screen()
+{
+    QTest::qWait(150);
+    return QGuiApplication::primaryScreen()->grabWindow(0).toImage();
+}
+
+// The share of dark pixels in a rectangle of the screen.
+double darkShare(const QImage& image, const QRect& area)
+{
+    int dark = 0, all = 0;
+    for (int y = area.top(); y <= area.bottom(); ++y)
+        for (int x = area.left(); x <= area.right(); ++x, ++all)
+            dark += qGray(image.pixel(x, y)) < 128;
+    return all ? double(dark) / all : 0;
+}
+
+bool windowManagerRuns()
+{
+    QProcess xprop;
+    xprop.start(QStringLiteral("xprop"),
+        {QStringLiteral("-root"), QStringLiteral("_NET_SUPPORTING_WM_CHECK")});
+    return xprop.waitForFinished(3000) && xprop.readAll().contains("window id");
+}
+
+} // namespace
+
+class tst_ClassicPrograms : public QObject {
+    Q_OBJECT
+
+private Q_SLOTS:
+    void initTestCase()
+    {
+        if (!m_x.load())
+            QSKIP("no X display with the XTEST extension");
+    }
+
+    void recordFields()
+    {
+        Program p(QStringLiteral("records"));
+        QVERIFY2(!p.waitFor(QStringLiteral("done=")).isEmpty(), qPrintable(p.seen().join('\n')));
+        // What a classic program reads straight from the records and globals.
+        const QStringList expected = {"black0=255", "gray01=43605", "screenPositive=1",
+            "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1", "windowKind=8",
+            "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7", "secondBehindFirst=1",
+            "contRgnWidth=300", "GetWRefCon=99", "pnLocAfterMove=35045", "txSize=18",
+            "rgnRect=1011070", "rgnOvalComplex=1", "random1=16807", "seedAfter=16807",
+            "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101", "shortDateLength=6",
+            "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1", "locked=1",
+            "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
+            "countMenus=3", "indString2=5", "missing=1", "homeFile=1", "teLength=13", "teLines=3",
+            "teTextSize=13", "teSel=407", "updateEvent=1", "trapAvailable=1", "gestalt=1",
+            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35", "polyPoint2=3040", "done=1"};
+        QStringList missing;
+        for (const QString& line : expected)
+            if (!p.seen().contains(line))
+                missing << line;
+        QVERIFY2(missing.isEmpty(),
+            qPrintable("missing: " + missing.join(' ') + "\nseen: " + p.seen().join(' ')));
+        int code = -1;
+        QVERIFY(p.finished(&code));
+        QCOMPARE(code, 0);
+    }
+
+    void documentWindow()
+    {
+        Program p(QStringLiteral("docwin"));
+        const QList<int> r = p.numbers(p.waitFor(QStringLiteral("ready")));
+        QCOMPARE(r.size(), 4);
+        QCOMPARE(r[2] - r[0], 360); // from its 'WIND'
+        QCOMPARE(r[3] - r[1], 240);
+
+        click(QPoint(r[0] + 50, r[1] + 40));
+        QCOMPARE(p.waitFor(QStringLiteral("content")), QStringLiteral("content 50 40"));
+
+        // Control plays the command key: the item's shortcut, or MenuKey on the key-down.
+        m_x.moveTo(QPoint(r[0] + 100, r[1] + 100));
+        m_x.key(kControl, true);
+        m_x.tap(kKeyN);
+        m_x.key(kControl, false);
+        const QString key = p.waitFor(QStringLiteral("menu"));
+        QVERIFY2(key == "menu 129 1" || key == "menukey 129 1", qPrintable(key));
+
+        // The first menu (the logo's, shown as the program's own) and its first item.
+        click(QPoint(12, 8));
+        QTest::qWait(300);
+        click(QPoint(40, 32));
+        QCOMPARE(p.waitFor(QStringLiteral("menu ")), QStringLiteral("menu 128 1"));
+
+        if (!windowManagerRuns())
+            return; // no frames without a window manager
+        // A title-bar drag, then the maximise button: mouse-downs after the window manager
+        // acted, in inDrag and inZoomOut.
+        m_x.moveTo(QPoint(r[0] + 100, r[1] - 13));
+        m_x.button(1, true);
+        for (int d = 5; d <= 40; d += 5) {
+            m_x.moveTo(QPoint(r[0] + 100 + d, r[1] - 13 + d));
+            QTest::qWait(20);
+        }
+        m_x.button(1, false);
+        QCOMPARE(p.waitFor(QStringLiteral("part")), QStringLiteral("part 4 1"));
+        const qsizetype beforeZoom = p.seen().size();
+        click(QPoint(r[2] + 40 - 23, r[1] + 40 - 13));
+        QCOMPARE(p.waitFor(QStringLiteral("part")), QStringLiteral("part 8 1"));
+        const QList<int> z = p.numbers(p.since(beforeZoom, QStringLiteral("geometry")));
+        QCOMPARE(z.size(), 4);
+        QVERIFY2(z[2] - z[0] > 360, qPrintable(p.seen().join('\n')));
+        // The close button, at the right of the title bar.
+        click(QPoint(z[2] - 7, z[1] - 13));
+        QCOMPARE(p.waitFor(QStringLiteral("close")), QStringLiteral("close 0 0"));
+        int code = -1;
+        QVERIFY(p.finished(&code));
+        QCOMPARE(code, 0);
+    }
+
+    void trackingLoopAndModes()
+    {
+        Program p(QStringLiteral("tracker"));
+        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
+        QCOMPARE(o.size(), 2);
+        const QPoint origin(o[0], o[1]);
+        m_x.moveTo(origin + QPoint(300, 250)); // out of the way
+        const QImage before = screen();
+        struct Case {
+            const char* what;
+            QRect local;
+            double minDark, maxDark;
+        };
+        // Patterns paint set bits in ink; srcBic text clears its pixels; patXor inverts.
+        const Case cases[] = {
+            {"ltGray is light", QRect(12, 12, 96, 46), 0.15, 0.35},
+            {"dkGray is dark", QRect(122, 12, 96, 46), 0.65, 0.85},
+            {"srcBic text clears", QRect(12, 72, 96, 46), 0.4, 0.95},
+            {"patXor inverts black", QRect(122, 72, 46, 46), 0.0, 0.05},
+            {"black beside it", QRect(172, 72, 46, 46), 0.95, 1.0},
+        };
+        for (const Case& c : cases) {
+            const double share = darkShare(before, c.local.translated(origin));
+            QVERIFY2(share >= c.minDark && share <= c.maxDark,
+                qPrintable(QStringLiteral("%1: %2").arg(QLatin1String(c.what)).arg(share)));
+        }
+
+        // While the button is held, the loop's lines reach the screen.
+        m_x.moveTo(origin + QPoint(40, 200));
+        m_x.button(1, true);
+        for (int x = 40; x <= 240; x += 20) {
+            m_x.moveTo(origin + QPoint(x, 200));
+            QTest::qWait(30);
+        }
+        QTest::qWait(300);
+        const QImage during = screen();
+        const double line = darkShare(during, QRect(origin + QPoint(60, 199), QSize(160, 2)));
+        m_x.button(1, false);
+        QVERIFY2(line > 0.9, qPrintable(QString::number(line)));
+        QCOMPARE(p.waitFor(QStringLiteral("tracked")), QStringLiteral("tracked 240 200"));
+    }
+
+    void gameLoop()
+    {
+        Program p(QStringLiteral("gameloop"));
+        QVERIFY(!p.waitFor(QStringLiteral("ready")).isEmpty());
+        QTest::qWait(1000);
+        m_x.moveTo(QPoint(200, 150));
+        m_x.tap(kKeyQ);
+        const QList<int> n = p.numbers(p.waitFor(QStringLiteral("key"))
+                                           .remove(QStringLiteral("frames "))
+                                           .remove(QStringLiteral("ticks ")));
+        QCOMPARE(n.size(), 3);
+        // A frame for most ticks: the loop never slept.
+        QVERIFY2(n[2] >= 40 && n[1] >= n[2] / 2, qPrintable(p.seen().join('\n')));
+    }
+
+private:
+    void click(const QPoint& at)
+    {
+        m_x.moveTo(at);
+        QTest::qWait(50);
+        m_x.button(1, true);
+        QTest::qWait(50);
+        m_x.button(1, false);
+    }
+
+    VelmarTest::XTestInput m_x;
+};
+
+VELMAR_TEST_MAIN(tst_ClassicPrograms)
+#include "tst_classicprograms.moc"
