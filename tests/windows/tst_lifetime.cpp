@@ -270,14 +270,22 @@ private Q_SLOTS:
     // A timer that removes itself and waits inside its own procedure.
     void timerRemovesItselfAndWaits()
     {
+        static int fired = 0;
+        fired = 0;
         const auto proc = [](EventLoopTimerRef timer, void*) {
+            ++fired;
             RemoveEventLoopTimer(timer);
             waitBriefly();
         };
         EventLoopTimerRef timer = nullptr;
-        InstallEventLoopTimer(GetMainEventLoop(), 0, 0, proc, nullptr, &timer);
-        for (int i = 0; i < 10; ++i)
-            waitBriefly();
+        InstallEventLoopTimer(GetMainEventLoop(), 0.01, 0.01, proc, nullptr, &timer);
+        for (int i = 0; i < 50 && fired == 0; ++i) {
+            EventRecord event;
+            WaitNextEvent(everyEvent, &event, 1, nullptr);
+        }
+        QCOMPARE(fired, 1);
+        // The timer's deletion waited for its procedure; nothing waits after this test.
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     }
 };
 
