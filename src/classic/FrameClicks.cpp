@@ -163,9 +163,10 @@ void watchMenuBar()
     if (installed)
         return;
     installed = true;
-    const Velmar::EventTypeSpec spec{Velmar::kEventClassVelmar, Velmar::kEventVelmarMenuTriggered};
+    const Velmar::EventTypeSpec menuChoice{Velmar::kEventClassVelmar,
+                                           Velmar::kEventVelmarMenuTriggered};
     Velmar::InstallEventHandler(
-        Velmar::GetApplicationEventTarget(), menuTriggered, 1, &spec, nullptr, nullptr);
+        Velmar::GetApplicationEventTarget(), menuTriggered, 1, &menuChoice, nullptr, nullptr);
 }
 
 void queueFrameClick(short part, Velmar::AQtWindow* window)

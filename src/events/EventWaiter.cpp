@@ -214,7 +214,7 @@ bool VelmarEventWaiter::ProcessCarbonEvents(UInt32 count, const EventTypeSpec* l
                 const std::vector<EventQueueItemSmartPtr> queued(queue.items().begin(),
                                                                  queue.items().end());
                 for (const EventQueueItemSmartPtr& item : queued) {
-                    if (item->revoked || (matches(item.get()) && item->isEventRecordCompatible()))
+                    if (matches(item.get()) && item->isEventRecordCompatible())
                         continue;
                     if (queue.remove(item.get()) && !item->IsSynchronized())
                         dispatch(item);
