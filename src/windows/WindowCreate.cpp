@@ -5,6 +5,7 @@
 #include <Velmar/Windows.h>
 
 #include "foundation/Conversions.h"
+#include "foundation/Lifetime.h"
 #include "windows/WindowPrivate.h"
 #include "windows/WindowVariants.h"
 
@@ -165,8 +166,12 @@ void DisposeWindow(WindowRef window)
 {
     if (!VELMAR_CHECK_WINDOW(window))
         return;
-    if (window->isVisible())
+    if (window->isVisible()) {
+        const KeepAlive hold(window);
         HideWindow(window);
+        if (!hold.alive() || window->IsDeletePending())
+            return; // the host disposed it while the hide waited
+    }
     if (userFocusRecord().data() == window.get())
         SetUserFocusWindow(nullptr);
     DelayedDecoration::removeWindow(window);

@@ -8,6 +8,8 @@
 #include <Velmar/Windows.h>
 
 #include "foundation/Conversions.h"
+#include "foundation/Lifetime.h"
+#include "platform/WindowSystem.h"
 #include "quickdraw/RegionHandles.h"
 #include "windows/WindowPorts.h"
 #include "windows/WindowPrivate.h"
@@ -61,6 +63,51 @@ QRect withOrigin(AQtWindow* window, const QRect& rect)
     return rect.translated(window->ReferenceOrigin());
 }
 
+// Qt 6.4's Wayland plugin frees a window's pending frame callback on two threads at once when
+// the window hides just as the compositor answers it (a double free, then a crash). Qt hands
+// the window an update request only once no frame callback is pending, so a window hidden
+// right after one is safe; the request itself is swallowed, as it would only paint again.
+class FrameCallbackSettler : public QObject {
+public:
+    explicit FrameCallbackSettler(QWindow* handle) : m_handle(handle)
+    {
+        m_handle->installEventFilter(this);
+        m_handle->requestUpdate();
+    }
+    bool settled() const { return m_settled || !m_handle; }
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override
+    {
+        if (watched != m_handle || event->type() != QEvent::UpdateRequest)
+            return false;
+        m_settled = true;
+        return true;
+    }
+
+private:
+    QPointer<QWindow> m_handle;
+    bool m_settled = false;
+};
+
+// At most a few frames: a compositor that stopped answering must not hold the hide up.
+constexpr int kFrameSettleWaitMs = 200;
+
+void settleFrameCallback(AQtWindow* window)
+{
+    if (Platform::windowSystem() != Platform::WindowSystem::Wayland)
+        return;
+    QWindow* handle = window->window()->windowHandle();
+    if (!handle || !handle->isVisible())
+        return;
+    const FrameCallbackSettler settler(handle);
+    const QDeadlineTimer deadline(kFrameSettleWaitMs);
+    while (!settler.settled() && !deadline.hasExpired()) {
+        QTimer::singleShot(std::min<qint64>(20, deadline.remainingTime()), [] {});
+        ProcessNonCarbonEvents(kShowHideProcessing | QEventLoop::WaitForMoreEvents);
+    }
+}
+
 } // namespace
 
 void ShowWindow(WindowRef window)
@@ -82,6 +129,13 @@ void HideWindow(WindowRef window)
     if (!VELMAR_CHECK_WINDOW(window))
         return;
     const bool wasVisible = window->isVisible();
+    if (wasVisible) {
+        // Waits run host code, which may dispose this window.
+        const KeepAlive hold(window);
+        settleFrameCallback(window);
+        if (!hold.alive() || window->IsDeletePending())
+            return;
+    }
     window->SetWindowVisible(false);
     if (wasVisible)
         settleShowHide(window);

@@ -380,7 +380,7 @@ private Q_SLOTS:
     void randomCalls()
     {
         const quint32 seed = qEnvironmentVariableIsSet("VELMAR_SOAK_SEED")
-            ? quint32(qEnvironmentVariableIntValue("VELMAR_SOAK_SEED"))
+            ? qEnvironmentVariable("VELMAR_SOAK_SEED").toUInt()
             : QRandomGenerator::global()->generate();
         const int seconds = qEnvironmentVariableIsSet("VELMAR_SOAK_SECONDS")
             ? qEnvironmentVariableIntValue("VELMAR_SOAK_SECONDS")
