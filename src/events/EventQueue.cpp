@@ -29,38 +29,115 @@ EventQueue::~EventQueue()
     clearAll();
 }
 
+namespace {
+
+UInt64 typeKey(UInt32 eventClass, UInt32 eventKind)
+{
+    return UInt64(eventClass) << 32 | eventKind;
+}
+
+// Gaps are dropped once they outnumber the items by this much: each rebuild is paid for by
+// as many removals as it walks entries.
+constexpr size_t kGapSlack = 64;
+
+} // namespace
+
+std::vector<EventQueueItemSmartPtr> EventQueue::items() const
+{
+    std::vector<EventQueueItemSmartPtr> items;
+    items.reserve(m_live);
+    for (const Entry& entry : m_entries) {
+        if (entry.item)
+            items.push_back(entry.item);
+    }
+    return items;
+}
+
 void EventQueue::append(const EventQueueItemSmartPtr& item)
 {
     if (!item)
         return;
-    m_items.push_back(item);
-    ++m_changes;
+    const UInt64 sequence = m_nextSequence++;
+    m_entries.push_back(Entry{sequence, item});
+    item->queuePlace.entries += 1;
+    item->queuePlace.sequence = sequence;
+    ++m_live;
+    m_byType[typeKey(item->eventClass, item->eventKind)].push_back(sequence);
     RaiseQueueChangedSignal();
+}
+
+EventQueue::EntryList::iterator EventQueue::entryAt(UInt64 sequence)
+{
+    return std::lower_bound(m_entries.begin(), m_entries.end(), sequence,
+        [](const Entry& entry, UInt64 wanted) { return entry.sequence < wanted; });
+}
+
+EventQueue::EntryList::const_iterator EventQueue::entryAt(UInt64 sequence) const
+{
+    return std::lower_bound(m_entries.begin(), m_entries.end(), sequence,
+        [](const Entry& entry, UInt64 wanted) { return entry.sequence < wanted; });
+}
+
+bool EventQueue::isQueued(UInt64 sequence) const
+{
+    const auto entry = entryAt(sequence);
+    return entry != m_entries.end() && entry->sequence == sequence && entry->item;
+}
+
+EventQueueItemSmartPtr EventQueue::takeEntry(EntryList::iterator entry)
+{
+    EventQueueItemSmartPtr item = std::move(entry->item);
+    entry->item = EventQueueItemSmartPtr();
+    item->queuePlace.entries -= 1;
+    --m_live;
+    dropGaps();
+    return item;
+}
+
+void EventQueue::dropGaps()
+{
+    while (!m_entries.empty() && !m_entries.front().item)
+        m_entries.pop_front();
+    while (!m_entries.empty() && !m_entries.back().item)
+        m_entries.pop_back();
+    if (m_entries.size() <= 2 * size_t(m_live) + kGapSlack)
+        return;
+    EntryList kept;
+    for (Entry& entry : m_entries) {
+        if (entry.item)
+            kept.push_back(std::move(entry));
+    }
+    m_entries.swap(kept);
+    rebuildIndex();
+}
+
+void EventQueue::rebuildIndex() const
+{
+    m_byType.clear();
+    for (const Entry& entry : m_entries) {
+        if (entry.item)
+            m_byType[typeKey(entry.item->eventClass, entry.item->eventKind)].push_back(
+                entry.sequence);
+    }
 }
 
 bool EventQueue::remove(const EventQueueItem* item)
 {
-    if (!item)
+    if (!contains(item))
         return false;
-    for (auto it = m_items.begin(); it != m_items.end(); ++it) {
-        if (it->get() == item) {
-            // Released after the entry is gone: its destruction must see a consistent queue.
-            EventQueueItemSmartPtr gone = std::move(*it);
-            m_items.erase(it);
-            ++m_changes;
-            return true;
-        }
+    auto entry = m_entries.end();
+    if (item->queuePlace.entries == 1) {
+        entry = entryAt(item->queuePlace.sequence);
+    } else {
+        // Queued more than once: the oldest entry goes.
+        entry = std::find_if(m_entries.begin(), m_entries.end(),
+            [item](const Entry& queued) { return queued.item.get() == item; });
     }
-    return false;
-}
-
-bool EventQueue::contains(const EventQueueItem* item) const
-{
-    for (const EventQueueItemSmartPtr& queued : m_items) {
-        if (queued.get() == item)
-            return true;
-    }
-    return false;
+    if (entry == m_entries.end() || entry->item.get() != item)
+        return false;
+    // Released after the entry is gone: its destruction must see a consistent queue.
+    const EventQueueItemSmartPtr gone = takeEntry(entry);
+    return true;
 }
 
 bool checkMainQueue(const EventQueue* queue, const char* file, int line, const char* function)
@@ -72,33 +149,64 @@ bool checkMainQueue(const EventQueue* queue, const char* file, int line, const c
     return false;
 }
 
+const EventQueue::Entry* EventQueue::oldestOfType(UInt32 eventClass, UInt32 eventKind) const
+{
+    const auto found = m_byType.find(typeKey(eventClass, eventKind));
+    if (found == m_byType.end())
+        return nullptr;
+    std::deque<UInt64>& sequences = found->second;
+    while (!sequences.empty()) {
+        const auto entry = entryAt(sequences.front());
+        if (entry != m_entries.end() && entry->sequence == sequences.front() && entry->item)
+            return &*entry;
+        sequences.pop_front();
+    }
+    m_byType.erase(found);
+    return nullptr;
+}
+
+const EventQueue::Entry* EventQueue::oldestMatching(const EventTypeSpec* list, UInt32 count) const
+{
+    if (count == 0 || !list) {
+        for (const Entry& entry : m_entries) {
+            if (entry.item)
+                return &entry;
+        }
+        return nullptr;
+    }
+    const Entry* oldest = nullptr;
+    for (UInt32 i = 0; i < count; ++i) {
+        const Entry* entry = oldestOfType(list[i].eventClass, list[i].eventKind);
+        if (entry && (!oldest || entry->sequence < oldest->sequence))
+            oldest = entry;
+    }
+    return oldest;
+}
+
 EventQueueItem* EventQueue::findFirstMatching(const EventTypeSpec* list, UInt32 count) const
 {
-    for (const EventQueueItemSmartPtr& item : m_items) {
-        if (MatchesEventTypes(list, count, item.get()))
-            return item.get();
-    }
-    return nullptr;
+    const Entry* entry = oldestMatching(list, count);
+    return entry ? entry->item.get() : nullptr;
 }
 
 EventQueueItemSmartPtr EventQueue::takeFirstMatching(const EventTypeSpec* list, UInt32 count)
 {
-    for (auto it = m_items.begin(); it != m_items.end(); ++it) {
-        if (MatchesEventTypes(list, count, it->get())) {
-            EventQueueItemSmartPtr found = std::move(*it);
-            m_items.erase(it);
-            ++m_changes;
-            return found;
-        }
-    }
-    return EventQueueItemSmartPtr();
+    const Entry* oldest = oldestMatching(list, count);
+    if (!oldest)
+        return EventQueueItemSmartPtr();
+    return takeEntry(entryAt(oldest->sequence));
 }
 
 void EventQueue::clearAll()
 {
-    ItemList gone;
-    gone.swap(m_items);
-    ++m_changes;
+    EntryList gone;
+    gone.swap(m_entries);
+    m_byType.clear();
+    m_live = 0;
+    for (Entry& entry : gone) {
+        if (entry.item)
+            entry.item->queuePlace.entries = 0;
+    }
 }
 
 int EventQueue::removeAll(const std::vector<const EventQueueItem*>& items)
@@ -109,16 +217,20 @@ int EventQueue::removeAll(const std::vector<const EventQueueItem*>& items)
     std::sort(doomed.begin(), doomed.end());
     // Released only once the queue is consistent again: a destructor may look at it.
     std::vector<EventQueueItemSmartPtr> gone;
-    ItemList kept;
-    for (EventQueueItemSmartPtr& queued : m_items) {
-        if (std::binary_search(doomed.begin(), doomed.end(), queued.get()))
-            gone.push_back(std::move(queued));
-        else
-            kept.push_back(std::move(queued));
+    EntryList kept;
+    for (Entry& entry : m_entries) {
+        if (!entry.item)
+            continue;
+        if (std::binary_search(doomed.begin(), doomed.end(), entry.item.get())) {
+            entry.item->queuePlace.entries -= 1;
+            gone.push_back(std::move(entry.item));
+        } else {
+            kept.push_back(std::move(entry));
+        }
     }
-    m_items.swap(kept);
-    if (!gone.empty())
-        ++m_changes;
+    m_entries.swap(kept);
+    m_live -= UInt32(gone.size());
+    rebuildIndex();
     return int(gone.size());
 }
 
@@ -126,7 +238,7 @@ void EventQueue::RaiseQueueChangedSignal()
 {
     if (m_carbonEventsDisabled || m_hasQueueChangeEvent)
         return;
-    if (m_items.empty() && (!LegacyEventProcessing() || CountPendingUpdateEvents() == 0))
+    if (m_live == 0 && (!LegacyEventProcessing() || CountPendingUpdateEvents() == 0))
         return;
     QCoreApplication* app = QCoreApplication::instance();
     if (!app)

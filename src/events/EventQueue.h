@@ -9,6 +9,7 @@
 #include <QEventLoop>
 
 #include <deque>
+#include <unordered_map>
 #include <vector>
 
 namespace Velmar::Private {
@@ -17,20 +18,23 @@ class TimerRegistry;
 
 class EventQueue {
 public:
-    using ItemList = std::deque<EventQueueItemSmartPtr>;
-
     EventQueue();
     ~EventQueue();
     EventQueue(const EventQueue&) = delete;
     EventQueue& operator=(const EventQueue&) = delete;
 
-    // The queued items, oldest first. Each entry holds one reference.
-    const ItemList& items() const { return m_items; }
-    UInt32 count() const { return UInt32(m_items.size()); }
-    bool isEmpty() const { return m_items.empty(); }
+    UInt32 count() const { return m_live; }
+    bool isEmpty() const { return m_live == 0; }
+    // The queued items, oldest first, each with its own reference: a copy the caller may walk
+    // while the queue changes.
+    std::vector<EventQueueItemSmartPtr> items() const;
+    // The first queued item for which pred(item) is true, oldest first, or null. For the
+    // library's own tests of an item: `pred` must not change the queue.
+    template <typename Pred>
+    EventQueueItem* firstWhere(Pred pred) const;
 
     // Appends without merging and raises the queue-changed signal. ScheduleEvent is the
-    // entry for new events; this is its last step.
+    // entry for new events; this is its last step. An item may be queued more than once.
     void append(const EventQueueItemSmartPtr& item);
     // Removes the first entry holding `item`. False when it is not queued.
     bool remove(const EventQueueItem* item);
@@ -43,13 +47,13 @@ public:
     // answered, or null. The same guarantees as removeIf.
     template <typename Pred>
     EventQueueItem* findIf(Pred pred);
-    // True while `item` is queued.
-    bool contains(const EventQueueItem* item) const;
+    // True while `item` (a live item) is queued.
+    bool contains(const EventQueueItem* item) const { return item && item->queuePlace.entries; }
     // Removes the entries holding these items in one pass; returns how many went.
     int removeAll(const std::vector<const EventQueueItem*>& items);
 
     // The first item whose (class, kind) is in the list (an empty list matches all),
-    // looked at or taken out. Null when none matches.
+    // looked at or taken out. Null when none matches. Logarithmic in the queue's length.
     EventQueueItem* findFirstMatching(const EventTypeSpec* list, UInt32 count) const;
     EventQueueItemSmartPtr takeFirstMatching(const EventTypeSpec* list, UInt32 count);
 
@@ -80,10 +84,36 @@ public:
 
     // Drops every queued item (tests, shutdown).
     void clearAll();
+    // Files the queued items by type again, after a queued item's class or kind changed.
+    void reindex() const { rebuildIndex(); }
 
 private:
-    ItemList m_items;
-    UInt64 m_changes = 0; // bumped by every change of m_items
+    // Entries in queue order with rising sequence numbers. An entry taken out of the middle
+    // stays as a gap (null item) until the gaps outnumber the items, so that every entry
+    // keeps its place and is found again by binary search on its number.
+    struct Entry {
+        UInt64 sequence;
+        EventQueueItemSmartPtr item;
+    };
+    using EntryList = std::deque<Entry>;
+
+    EntryList::iterator entryAt(UInt64 sequence);
+    EntryList::const_iterator entryAt(UInt64 sequence) const;
+    bool isQueued(UInt64 sequence) const;
+    // The oldest queued entry of one (class, kind), or null; drops stale index numbers.
+    const Entry* oldestOfType(UInt32 eventClass, UInt32 eventKind) const;
+    const Entry* oldestMatching(const EventTypeSpec* list, UInt32 count) const;
+    // Takes the entry's item out of the queue (the entry becomes a gap) and returns it.
+    EventQueueItemSmartPtr takeEntry(EntryList::iterator entry);
+    void dropGaps();
+    void rebuildIndex() const;
+
+    EntryList m_entries;
+    UInt32 m_live = 0;
+    UInt64 m_nextSequence = 1;
+    // Sequence numbers of each (class, kind), oldest first. Numbers of entries taken out
+    // stay until they reach the front or the list is rebuilt.
+    mutable std::unordered_map<UInt64, std::deque<UInt64>> m_byType;
     bool m_inNonCarbonProcessing = false;
     bool m_hasQueueChangeEvent = false;
     bool m_carbonEventsDisabled = false;
@@ -119,18 +149,24 @@ void ScheduleEvent(const EventQueueItemSmartPtr& item, EventQueueItem::MergePoli
 void FlushEventReferences(AQtWindow* window);
 
 template <typename Pred>
+EventQueueItem* EventQueue::firstWhere(Pred pred) const
+{
+    for (const Entry& entry : m_entries) {
+        if (entry.item && pred(entry.item.get()))
+            return entry.item.get();
+    }
+    return nullptr;
+}
+
+template <typename Pred>
 int EventQueue::removeIf(Pred pred)
 {
     // Walk a snapshot that holds its own references: whatever the predicate does to the
-    // queue, no item it is shown can be freed under it and no iterator can go stale. Only
-    // once the queue has changed under the walk is each item checked to be still queued.
-    const std::vector<EventQueueItemSmartPtr> snapshot(m_items.begin(), m_items.end());
-    const UInt64 changesAtStart = m_changes;
+    // queue, no item it is shown can be freed under it and no iterator can go stale.
+    const std::vector<EventQueueItemSmartPtr> queued = items();
     std::vector<const EventQueueItem*> doomed;
-    for (const EventQueueItemSmartPtr& item : snapshot) {
-        if (m_changes != changesAtStart && !contains(item.get()))
-            continue;
-        if (pred(item.get()))
+    for (const EventQueueItemSmartPtr& item : queued) {
+        if (contains(item.get()) && pred(item.get()))
             doomed.push_back(item.get());
     }
     return removeAll(doomed);
@@ -139,13 +175,10 @@ int EventQueue::removeIf(Pred pred)
 template <typename Pred>
 EventQueueItem* EventQueue::findIf(Pred pred)
 {
-    const std::vector<EventQueueItemSmartPtr> snapshot(m_items.begin(), m_items.end());
-    const UInt64 changesAtStart = m_changes;
-    for (const EventQueueItemSmartPtr& item : snapshot) {
-        if (m_changes != changesAtStart && !contains(item.get()))
-            continue;
+    const std::vector<EventQueueItemSmartPtr> queued = items();
+    for (const EventQueueItemSmartPtr& item : queued) {
         // The item is handed back without a reference: only while the queue still holds one.
-        if (pred(item.get()) && (m_changes == changesAtStart || contains(item.get())))
+        if (contains(item.get()) && pred(item.get()) && contains(item.get()))
             return item.get();
     }
     return nullptr;

@@ -38,7 +38,7 @@ EventQueueItem::EventQueueItem()
     noteCreated();
 }
 
-EventQueueItem::EventQueueItem(const EventQueueItem& other)
+EventQueueItem::EventQueueItem(const EventQueueItem& other) : queuePlace{}
 {
     *this = other;
     refCount = 1;
@@ -118,8 +118,11 @@ void EventQueueItem::clear()
 
 EventQueueItem& EventQueueItem::operator=(const EventQueueItem& other)
 {
-    if (this != &other)
+    if (this != &other) {
+        const QueuePlace place = queuePlace;
         std::memcpy(static_cast<void*>(this), static_cast<const void*>(&other), sizeof(EventQueueItem));
+        queuePlace = place;
+    }
     return *this;
 }
 

@@ -62,6 +62,12 @@ public:
     // by ReceiveNextEvent): ReleaseEvent may give back only these, never a reference the
     // queue or a handler chain holds.
     UInt16 hostRefCount;
+    // Where the queue holds this item: how many entries, and the newest entry's sequence
+    // number. Kept by the queue alone; copying an item leaves the target's as they were.
+    struct QueuePlace {
+        UInt32 entries = 0;
+        UInt64 sequence = 0;
+    } queuePlace;
 
     static EventQueueItem* Create();
     EventQueueItem* Duplicate() const;

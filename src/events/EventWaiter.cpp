@@ -211,8 +211,7 @@ bool VelmarEventWaiter::ProcessCarbonEvents(UInt32 count, const EventTypeSpec* l
                 // One at a time, each leaving the queue just before its handlers run: what an
                 // earlier handler revoked (its window disposed) or took is no longer queued
                 // and is never delivered; what handlers post waits for the next look.
-                const std::vector<EventQueueItemSmartPtr> queued(queue.items().begin(),
-                                                                 queue.items().end());
+                const std::vector<EventQueueItemSmartPtr> queued = queue.items();
                 for (const EventQueueItemSmartPtr& item : queued) {
                     if (matches(item.get()) && item->isEventRecordCompatible())
                         continue;

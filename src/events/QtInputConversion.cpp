@@ -197,10 +197,27 @@ bool ConvertKeyEvent(QKeyEvent* e, EventRef item)
     return true;
 }
 
+namespace {
+
+bool convertInto(AQtWindow* window, QEvent* e, EventRef item);
+
+} // namespace
+
 bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventRef item)
 {
     if (!item || !VELMAR_CHECK_EVENT(item))
         return false;
+    const bool converted = convertInto(window, e, item);
+    // A host may convert into an event it has queued: the queue files events by type.
+    if (gMainEventQueue.contains(item))
+        gMainEventQueue.reindex();
+    return converted;
+}
+
+namespace {
+
+bool convertInto(AQtWindow* window, QEvent* e, EventRef item)
+{
     item->clear();
     item->when = TickCount();
     if (!e) {
@@ -258,5 +275,7 @@ bool ConvertVelmarEvent(AQtWindow* window, QEvent* e, EventRef item)
         return false;
     }
 }
+
+} // namespace
 
 } // namespace Velmar

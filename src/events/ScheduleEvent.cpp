@@ -49,12 +49,11 @@ void ScheduleEvent(const EventQueueItemSmartPtr& scheduled, EventQueueItem::Merg
         VELMAR_ASSERT(item->window, "item->window != NULL");
         switch (policy) {
         case EventQueueItem::MergeIntoQueued:
-            for (const EventQueueItemSmartPtr& queued : queue.items()) {
-                if (isTwin(queued.get(), item.get())) {
-                    queued->Merge(item.get());
-                    queue.RaiseQueueChangedSignal();
-                    return;
-                }
+            if (EventQueueItem* twin = queue.firstWhere(
+                    [&item](const EventQueueItem* queued) { return isTwin(queued, item.get()); })) {
+                twin->Merge(item.get());
+                queue.RaiseQueueChangedSignal();
+                return;
             }
             break;
         case EventQueueItem::ReplaceQueued:

@@ -21,12 +21,10 @@ constexpr UInt8 kEscapeChar = 27;
 
 bool queuedEscape()
 {
-    for (const EventQueueItemSmartPtr& item : gMainEventQueue.items()) {
-        if (item->eventClass == kEventClassKeyboard && item->charCode == kEscapeChar
-            && item->modifiers == 0)
-            return true;
-    }
-    return false;
+    return gMainEventQueue.firstWhere([](const EventQueueItem* item) {
+        return item->eventClass == kEventClassKeyboard && item->charCode == kEscapeChar
+            && item->modifiers == 0;
+    }) != nullptr;
 }
 
 // Command-period: Control plays the command key; a French keyboard has its period shifted,

@@ -32,7 +32,7 @@ void EventPane::refresh()
 void EventPane::refreshQueue(Row* group)
 {
     RowSync rows(group);
-    const EventQueue::ItemList& items = gMainEventQueue.items();
+    const std::vector<EventQueueItemSmartPtr> items = gMainEventQueue.items();
     int shown = 0;
     for (const EventQueueItemSmartPtr& item : items) {
         if (shown == kMaxQueueRows)
