@@ -38,12 +38,21 @@ TimerRegistry::~TimerRegistry()
 {
     // Timer objects can only be deleted while Qt's thread data is still around.
     if (QCoreApplication::instance())
-        qDeleteAll(m_timers);
+        qDeleteAll(timers());
+}
+
+QList<VelmarEventLoopTimer*> TimerRegistry::timers() const
+{
+    QList<VelmarEventLoopTimer*> list;
+    list.reserve(qsizetype(m_byOrder.size()));
+    for (const auto& [order, timer] : m_byOrder)
+        list.append(timer);
+    return list;
 }
 
 bool TimerRegistry::contains(const VelmarEventLoopTimer* timer) const
 {
-    return timer && m_timers.contains(timer);
+    return timer && m_order.contains(timer);
 }
 
 // A new timer runs at once unless a blocker is active right now: timers stopped by a blocker
@@ -51,16 +60,20 @@ bool TimerRegistry::contains(const VelmarEventLoopTimer* timer) const
 // never belonged to it.
 void TimerRegistry::add(VelmarEventLoopTimer* timer)
 {
-    m_timers.append(timer);
+    const quint64 order = m_nextOrder++;
+    m_byOrder.emplace(order, timer);
+    m_order.insert(timer, order);
     if (gMainEventQueue.CheckCarbonEventsDisabled())
         timer->stop();
 }
 
 bool TimerRegistry::remove(VelmarEventLoopTimer* timer)
 {
-    if (!contains(timer))
+    const auto found = timer ? m_order.constFind(timer) : m_order.constEnd();
+    if (found == m_order.constEnd())
         return false;
-    m_timers.removeOne(timer);
+    m_byOrder.erase(found.value());
+    m_order.erase(found);
     if (timer->isFiring()) {
         // Removed from inside its own procedure: delete once its timer event is done.
         timer->stop();
@@ -76,7 +89,7 @@ void TimerRegistry::suspend()
     if (!m_enabled)
         return;
     m_enabled = false;
-    for (VelmarEventLoopTimer* timer : std::as_const(m_timers))
+    for (const auto& [order, timer] : m_byOrder)
         timer->stop();
 }
 
@@ -87,9 +100,9 @@ void TimerRegistry::resume()
     dispatchPostponedTimers();
     m_enabled = true;
     // A procedure run from a re-posted timer event may install or remove timers: walk a copy.
-    const QList<VelmarEventLoopTimer*> timers = m_timers;
-    for (VelmarEventLoopTimer* timer : timers) {
-        if (m_timers.contains(timer))
+    const QList<VelmarEventLoopTimer*> installed = timers();
+    for (VelmarEventLoopTimer* timer : installed) {
+        if (contains(timer))
             timer->start();
     }
 }

@@ -1,7 +1,10 @@
 // The event loop timers of the main queue, suspended while Carbon dispatch is blocked.
 #pragma once
 
+#include <QHash>
 #include <QList>
+
+#include <map>
 
 namespace Velmar::Private {
 
@@ -15,7 +18,8 @@ public:
     TimerRegistry& operator=(const TimerRegistry&) = delete;
 
     bool isEnabled() const { return m_enabled; }
-    const QList<VelmarEventLoopTimer*>& timers() const { return m_timers; }
+    // In installation order.
+    QList<VelmarEventLoopTimer*> timers() const;
     bool contains(const VelmarEventLoopTimer* timer) const;
 
     void add(VelmarEventLoopTimer* timer);
@@ -30,7 +34,11 @@ public:
 
 private:
     bool m_enabled = true;
-    QList<VelmarEventLoopTimer*> m_timers; // installation order
+    // Installation order by number, and each timer's number: adding, finding and removing
+    // stay cheap with thousands installed.
+    std::map<quint64, VelmarEventLoopTimer*> m_byOrder;
+    QHash<const VelmarEventLoopTimer*, quint64> m_order;
+    quint64 m_nextOrder = 0;
 };
 
 TimerRegistry& MainTimerRegistry();
