@@ -16,6 +16,7 @@
 
 #include <QPainter>
 
+#include <cstring>
 #include <optional>
 #include <vector>
 
@@ -112,9 +113,11 @@ const QRgb* sourceRow(const PixelMap& map, const PlaneMap& plane, int row, int c
     if (plane.x.unscaled)
         return line + plane.x.at(column);
     buffer.resize(std::size_t(count));
+    const int* reads = plane.x.table.data() + column;
+    QRgb* gathered = buffer.data();
     for (int i = 0; i < count; ++i)
-        buffer[std::size_t(i)] = line[plane.x.at(column + i)];
-    return buffer.data();
+        gathered[i] = line[reads[i]];
+    return gathered;
 }
 
 TransferInk currentInk()
@@ -259,19 +262,30 @@ void runCopy(const CopyJob& job)
     // Taken once: every row through scanLine() would ask the image to detach again.
     uchar* const dstBits = dst.image->bits();
     const qsizetype dstStride = dst.image->bytesPerLine();
+    // Rows that read the same source row (a copy scaled up) come out the same when the
+    // mode looks at the source alone: the first is computed, the others copied from it.
+    const bool sameRowsSame = !job.hasMask && !transferReadsDestination(transfer);
     const auto copyRect = [&](const QRect& r) {
         const int column = r.left() - dstRect.left();
         const int count = r.width();
+        const QRgb* lastOut = nullptr;
+        int lastSourceRow = -1;
         for (int y = r.top(); y <= r.bottom(); ++y) {
             const int row = y - dstRect.top();
             if (job.field >= 0 && (row & 1) != job.field)
                 continue;
             const QPoint at = dst.toImage(QPoint(r.left(), y));
             auto* out = reinterpret_cast<QRgb*>(dstBits + at.y() * dstStride) + at.x();
-            const QRgb* in = sourceRow(src, srcPlane, srcPlane.y.at(row), column,
-                                       count, srcBuffer);
+            const int sourceRowIndex = srcPlane.y.at(row);
+            if (sameRowsSame && sourceRowIndex == lastSourceRow) {
+                std::memcpy(out, lastOut, std::size_t(count) * sizeof(QRgb));
+                continue;
+            }
+            const QRgb* in = sourceRow(src, srcPlane, sourceRowIndex, column, count, srcBuffer);
             if (!job.hasMask) {
                 transfer(in, out, count, ink);
+                lastOut = out;
+                lastSourceRow = sourceRowIndex;
                 continue;
             }
             work.assign(out, out + count);

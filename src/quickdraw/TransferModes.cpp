@@ -147,6 +147,11 @@ constexpr ModeEntry kModes[] = {
 
 } // namespace
 
+bool transferReadsDestination(RowTransfer transfer)
+{
+    return transfer != copyAny<false> && transfer != copyAny<true>;
+}
+
 void maskRow(const QRgb* copied, const QRgb* mask, QRgb* dst, int count)
 {
     for (int i = 0; i < count; ++i) {

@@ -23,6 +23,9 @@ using RowTransfer = void (*)(const QRgb* src, QRgb* dst, int count, const Transf
 // The row function for `mode` (ditherCopy ignored). A mode the library does not know is
 // logged in the NotImpl category under `call` and copies as srcCopy.
 RowTransfer rowTransferFor(SInt16 mode, const char* call);
+// True unless the row function's result depends on the source words alone (the copy
+// modes): rows copied from one source row are then the same and can be copied once.
+bool transferReadsDestination(RowTransfer transfer);
 // Lays `copied` over the destination words, each component in proportion to how dark the
 // mask's component is (black: all of it, white: none).
 void maskRow(const QRgb* copied, const QRgb* mask, QRgb* dst, int count);
