@@ -49,13 +49,14 @@ QString MakeQString(const char* text, SInt32 length)
 
 QByteArray MakeLocal8Bit(const QString& s)
 {
-    if (Private::asciiPassesUnchanged() && QtPrivate::isAscii(QStringView(s))) {
-        QByteArray bytes = s.toLatin1();
-        const qsizetype nul = bytes.indexOf('\0');
-        if (nul >= 0)
-            bytes.truncate(nul);
-        bytes.append('\0'); // part of the array, as below
-        return bytes;
+    if (Private::asciiPassesUnchanged()) {
+        QByteArray bytes(s.size() + 1, Qt::Uninitialized);
+        const qsizetype length = Private::asciiToHostBytes(s, bytes.data(), s.size());
+        if (length >= 0) {
+            bytes.truncate(length + 1);
+            bytes[length] = '\0'; // part of the array, as below
+            return bytes;
+        }
     }
     const qsizetype length = s.size();
     const qsizetype capacity = (length + 1) * 4;

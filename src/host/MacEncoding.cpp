@@ -101,6 +101,21 @@ bool asciiPassesUnchanged()
     return gAsciiIdentity == 1;
 }
 
+qsizetype asciiToHostBytes(QStringView text, char* out, qsizetype capacity)
+{
+    if (!asciiPassesUnchanged())
+        return -1;
+    const qsizetype nul = text.indexOf(QChar(0));
+    const QStringView kept = nul >= 0 ? text.left(nul) : text;
+    if (!QtPrivate::isAscii(kept))
+        return -1;
+    const qsizetype count = std::min(kept.size(), capacity);
+    const char16_t* units = kept.utf16();
+    for (qsizetype i = 0; i < count; ++i)
+        out[i] = char(units[i]);
+    return count;
+}
+
 // Checked at once, so that conversions never pay for it.
 void encodingChanged()
 {

@@ -102,9 +102,13 @@ void AbstractIcon::Draw(
     placed.moveCenter(target.center());
     // Icons keep their own transparency whatever the pen mode.
     const QPainter::CompositionMode mode = painter->compositionMode();
-    painter->setCompositionMode(QPainter::CompositionMode_SourceOver);
-    painter->drawImage(placed.topLeft(), drawn);
-    painter->setCompositionMode(mode);
+    if (mode == QPainter::CompositionMode_SourceOver) {
+        painter->drawImage(placed.topLeft(), drawn);
+    } else {
+        painter->setCompositionMode(QPainter::CompositionMode_SourceOver);
+        painter->drawImage(placed.topLeft(), drawn);
+        painter->setCompositionMode(mode);
+    }
     painter |= placed;
 }
 

@@ -5,6 +5,8 @@
 #include <Velmar/Scrap.h>
 #include <Velmar/TextUtils.h>
 
+#include "host/MacEncodingAscii.h"
+
 #include <QClipboard>
 #include <QGuiApplication>
 
@@ -113,6 +115,12 @@ OSStatus GetScrapFlavorData(ScrapRef, ScrapFlavorType flavorType, SInt32* size, 
     if (text.isEmpty()) {
         *size = 0;
         return noTypeErr;
+    }
+    // Plain ASCII goes straight into the host's block.
+    const qsizetype direct = Private::asciiToHostBytes(text, static_cast<char*>(data), *size);
+    if (direct >= 0) {
+        *size = SInt32(direct);
+        return noErr;
     }
     const QByteArray bytes = scrapText(text);
     const SInt32 count = std::min(*size, SInt32(bytes.size() - 1));
