@@ -5,6 +5,7 @@
 
 #include "events/EventQueue.h"
 
+#include <Velmar/CarbonEventHandlers.h>
 #include <Velmar/Events.h>
 
 using namespace Velmar;
@@ -67,8 +68,27 @@ void ScheduleTake(benchmark::State& state)
     finish(state);
 }
 
+void neverCalled(EventLoopTimerRef, void*) {}
+
+// Installing a timer and removing it again with N other timers pending (an hour away).
+void TimerInstallRemove(benchmark::State& state)
+{
+    std::vector<EventLoopTimerRef> pending(std::size_t(state.range(0)));
+    for (EventLoopTimerRef& timer : pending)
+        InstallEventLoopTimer(GetMainEventLoop(), 3600, 3600, neverCalled, nullptr, &timer);
+    for (auto _ : state) {
+        EventLoopTimerRef timer = nullptr;
+        InstallEventLoopTimer(GetMainEventLoop(), 3600, 3600, neverCalled, nullptr, &timer);
+        RemoveEventLoopTimer(timer);
+    }
+    for (EventLoopTimerRef timer : pending)
+        RemoveEventLoopTimer(timer);
+    state.SetItemsProcessed(state.iterations());
+}
+
 } // namespace
 
+BENCHMARK(TimerInstallRemove)->Name("Events/TimerInstallRemove")->Arg(0)->Arg(10000);
 BENCHMARK(PostTake)->Name("Events/PostTake")->Arg(0)->Arg(100)->Arg(10000);
 BENCHMARK(ScheduleTake)->Name("Events/ScheduleTake")->Arg(0)->Arg(100)->Arg(10000);
 

@@ -7,6 +7,8 @@
 #include <Velmar/TextEdit.h>
 #include <Velmar/Windows.h>
 
+#include <QClipboard>
+#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QPlainTextEdit>
 
@@ -143,6 +145,32 @@ void Qt_GetOffset1000Lines(benchmark::State& state)
     }
 }
 
+// A paste of `state.range(0)` KB of 64-character lines into each kind of record: plain,
+// single-line (lines joined into one), no-wrap, and styled.
+enum PasteKind { kPlain, kSingleLine, kNoWrap, kStyled };
+
+void QD_Paste(benchmark::State& state)
+{
+    Setup s;
+    const auto kind = PasteKind(state.range(1));
+    TEPtr* te = kind == kStyled ? TEStyleNew(&kView, &kView) : TENew(&kView, &kView);
+    if (kind == kSingleLine)
+        te->setAllowMultipleBlocks(false);
+    if (kind == kNoWrap)
+        te->SetLineNoWrapMode();
+    QByteArray text = lines(int(state.range(0) * 1024 / 64), 64);
+    text.replace('\r', '\n');
+    QGuiApplication::clipboard()->setText(QString::fromLatin1(text));
+    for (auto _ : state) {
+        state.PauseTiming();
+        TESetText("", 0, te);
+        state.ResumeTiming();
+        TEPaste(te);
+        QCoreApplication::processEvents(); // the layout and the first paint
+    }
+    TEDispose(te);
+}
+
 } // namespace
 
 BENCHMARK(QD_SetText100K)->Name("QD/TESetText100K")->Unit(benchmark::kMicrosecond);
@@ -151,5 +179,12 @@ BENCHMARK(QD_Key1000)->Name("QD/TEKey1000")->Unit(benchmark::kMicrosecond);
 BENCHMARK(Qt_Key1000)->Name("Qt/TEKey1000")->Unit(benchmark::kMicrosecond);
 BENCHMARK(QD_GetOffset1000Lines)->Name("QD/TEGetOffset1000Lines");
 BENCHMARK(Qt_GetOffset1000Lines)->Name("Qt/TEGetOffset1000Lines");
+
+BENCHMARK(QD_Paste)
+    ->Name("TEPaste")
+    ->ArgsProduct({{1024, 4096}, {kPlain, kSingleLine, kNoWrap, kStyled}})
+    ->ArgNames({"KB", "kind"})
+    ->Unit(benchmark::kMillisecond)
+    ->Iterations(1);
 
 VELMAR_BENCHMARK_MAIN()
