@@ -202,6 +202,7 @@ void pushGeometry(PortLink& link)
 {
     Velmar::GrafPtr port = link.port();
     // A port on the program's bitmap keeps the portRect and portBits the program gave it.
+    loadProgramBits(link);
     if (!port || boundToProgramBits(link))
         return;
     GrafPort* r = link.record;
@@ -313,6 +314,7 @@ void ClosePort(GrafPtr port)
 void SetOrigin(short h, short v)
 {
     if (PortLink* link = currentLink()) {
+        loadProgramBits(*link);
         if (boundToProgramBits(*link)) {
             // The bitmap's coordinates move with the port's, as the classic call moved
             // portRect and portBits.bounds together.
@@ -336,6 +338,7 @@ void SetOrigin(short h, short v)
 void PortSize(short width, short height)
 {
     if (PortLink* link = currentLink()) {
+        loadProgramBits(*link);
         if (boundToProgramBits(*link)) {
             // The bitmap keeps its size; only the record's rectangle changes.
             link->record->portRect.right = short(link->record->portRect.left + width);

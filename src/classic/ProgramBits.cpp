@@ -12,6 +12,11 @@
 
 namespace VelmarClassic {
 
+bool boundToProgramBits(const PortLink& link)
+{
+    return link.boundBits.baseAddr != nullptr;
+}
+
 namespace {
 
 // Large enough for any bitmap of the time; beyond it a made-up record is refused.
@@ -53,10 +58,15 @@ Words worldWords(const PortLink& link)
 
 void bind(PortLink& link, const BitMap& bits)
 {
+    const bool wasBound = boundToProgramBits(link);
     link.boundBits = BitMap{};
     link.bitsSeen.clear();
-    if (!usable(bits))
+    if (!usable(bits)) {
+        // Back on the screen, as a new port.
+        if (wasBound)
+            Velmar::SetPortBounds(link.port(), &globals()->screenBits.bounds);
         return;
+    }
     Velmar::SetPortBounds(link.port(), &bits.bounds);
     const Words w = worldWords(link);
     Rect bounds{};
@@ -67,11 +77,6 @@ void bind(PortLink& link, const BitMap& bits)
 }
 
 } // namespace
-
-bool boundToProgramBits(const PortLink& link)
-{
-    return link.boundBits.baseAddr != nullptr;
-}
 
 void loadProgramBits(PortLink& link)
 {
