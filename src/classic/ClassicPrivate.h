@@ -74,6 +74,7 @@ struct PortLink {
     // is then the bitmap's size and the memory is kept in step with it (ProgramBits.cpp).
     BitMap boundBits{}; // baseAddr null: not bound
     QByteArray bitsSeen; // the bitmap's bytes as last read or written by the layer
+    std::vector<Velmar::UInt32> worldSeen; // the library port's pixels as last written back
     Velmar::GrafPtr port() const;
 };
 

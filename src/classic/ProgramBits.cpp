@@ -61,6 +61,7 @@ void bind(PortLink& link, const BitMap& bits)
     const bool wasBound = boundToProgramBits(link);
     link.boundBits = BitMap{};
     link.bitsSeen.clear();
+    link.worldSeen.clear();
     if (!usable(bits)) {
         // Back on the screen, as a new port.
         if (wasBound)
@@ -98,11 +99,13 @@ void loadProgramBits(PortLink& link)
     const int width = bits.bounds.right - bits.bounds.left;
     const int height = bits.bounds.bottom - bits.bounds.top;
     const auto* bytes = reinterpret_cast<const Velmar::UInt8*>(bits.baseAddr);
+    link.worldSeen.resize(std::size_t(width) * std::size_t(height));
     for (int y = 0; y < height; ++y) {
         const Velmar::UInt8* row = bytes + qsizetype(y) * bits.rowBytes;
         Velmar::UInt32* out = w.base + y * w.stride;
         for (int x = 0; x < width; ++x)
             out[x] = (row[x >> 3] & (0x80 >> (x & 7))) ? kBlack : kWhite;
+        std::memcpy(link.worldSeen.data() + qsizetype(y) * width, out, std::size_t(width) * 4);
     }
     link.bitsSeen = QByteArray(bits.baseAddr, size);
 }
@@ -112,24 +115,38 @@ void storeProgramBits(PortLink& link)
     if (!boundToProgramBits(link))
         return;
     const Words w = worldWords(link);
-    if (!w.base)
-        return;
     const BitMap& bits = link.boundBits;
     const int width = bits.bounds.right - bits.bounds.left;
     const int height = bits.bounds.bottom - bits.bounds.top;
+    // Filled by loadProgramBits, which every drawing call runs first.
+    if (!w.base || link.worldSeen.size() != std::size_t(width) * std::size_t(height)
+        || link.bitsSeen.size() != byteCount(bits))
+        return;
     auto* bytes = reinterpret_cast<Velmar::UInt8*>(bits.baseAddr);
+    auto* seenBytes = reinterpret_cast<Velmar::UInt8*>(link.bitsSeen.data());
+    // Only the pixels that changed since the last write-back: rows compared whole, then the
+    // span between the first and last changed pixel converted.
     for (int y = 0; y < height; ++y) {
-        Velmar::UInt8* row = bytes + qsizetype(y) * bits.rowBytes;
         const Velmar::UInt32* in = w.base + y * w.stride;
+        Velmar::UInt32* seen = link.worldSeen.data() + qsizetype(y) * width;
+        if (std::memcmp(in, seen, std::size_t(width) * 4) == 0)
+            continue;
+        int first = 0, last = width - 1;
+        while (in[first] == seen[first])
+            ++first;
+        while (in[last] == seen[last])
+            --last;
+        std::memcpy(seen + first, in + first, std::size_t(last - first + 1) * 4);
+        const qsizetype rowStart = qsizetype(y) * bits.rowBytes;
         // Bits beyond the bounds in the last byte are the program's and stay as they were.
-        for (int x = 0; x < width; ++x) {
-            const Velmar::UInt32 c = in[x];
-            const bool dark = qGray(QRgb(c)) < 128;
+        for (int x = first; x <= last; ++x) {
+            const bool dark = qGray(QRgb(in[x])) < 128;
             const Velmar::UInt8 bit = Velmar::UInt8(0x80 >> (x & 7));
-            row[x >> 3] = Velmar::UInt8(dark ? (row[x >> 3] | bit) : (row[x >> 3] & ~bit));
+            Velmar::UInt8& byte = bytes[rowStart + (x >> 3)];
+            byte = Velmar::UInt8(dark ? (byte | bit) : (byte & ~bit));
+            seenBytes[rowStart + (x >> 3)] = byte;
         }
     }
-    link.bitsSeen = QByteArray(bits.baseAddr, byteCount(bits));
 }
 
 } // namespace VelmarClassic
