@@ -292,7 +292,6 @@ VELMAR_CLASSIC_API void CopyBits(const BitMap* srcBits, const BitMap* dstBits, c
 VELMAR_CLASSIC_API void CopyMask(const BitMap* srcBits, const BitMap* maskBits,
                                  const BitMap* dstBits, const Rect* srcRect, const Rect* maskRect,
                                  const Rect* dstRect);
-VELMAR_CLASSIC_API const BitMap* GetPortBitMapForCopyBits(CGrafPtr port);
 
 VELMAR_CLASSIC_API RgnHandle NewRgn(void);
 VELMAR_CLASSIC_API void DisposeRgn(RgnHandle rgn);

@@ -155,12 +155,6 @@ void CopyMask(const BitMap* srcBits, const BitMap* maskBits, const BitMap* dstBi
     finish(dst);
 }
 
-const BitMap* GetPortBitMapForCopyBits(CGrafPtr port)
-{
-    PortLink* link = checkedPort(reinterpret_cast<GrafPtr>(port), "GetPortBitMapForCopyBits");
-    return link ? &link->record->portBits : nullptr;
-}
-
 namespace VelmarClassic {
 
 void copyIntoCurrentPort(const Velmar::BitMap& bits, const Rect& dstRect, short mode)
