@@ -19,8 +19,10 @@ bool boundToProgramBits(const PortLink& link)
 
 namespace {
 
-// Large enough for any bitmap of the time; beyond it a made-up record is refused.
-constexpr int kMaxSide = 16384;
+// Large enough for any bitmap of the time; beyond it a made-up record is refused (the
+// library port behind it takes four bytes a pixel).
+constexpr int kMaxSide = 8192;
+constexpr qint64 kMaxPixels = 16 * 1024 * 1024;
 constexpr Velmar::UInt32 kBlack = 0xFF000000u, kWhite = 0xFFFFFFFFu;
 
 bool sameBits(const BitMap& a, const BitMap& b)
@@ -35,7 +37,8 @@ bool usable(const BitMap& bits)
     const int width = bits.bounds.right - bits.bounds.left;
     const int height = bits.bounds.bottom - bits.bounds.top;
     return bits.baseAddr && (bits.rowBytes & 0xC000) == 0 && width > 0 && height > 0
-        && width <= kMaxSide && height <= kMaxSide && bits.rowBytes * 8 >= width;
+        && width <= kMaxSide && height <= kMaxSide && qint64(width) * height <= kMaxPixels
+        && bits.rowBytes * 8 >= width;
 }
 
 qsizetype byteCount(const BitMap& bits)

@@ -51,10 +51,13 @@ template <typename Draw> void drawThroughMode(PortLink& link, short mode, short 
     // The not- modes change the whole character box; the others only where glyphs are, so
     // their box leaves room for overhanging (italic, outlined) glyphs.
     const int pad = mode >= notSrcCopy ? 0 : int(info.ascent()) / 3 + 2;
-    const Rect box{clampShort(pen.v - int(info.ascent())), clampShort(pen.h - pad),
+    const Rect text{clampShort(pen.v - int(info.ascent())), clampShort(pen.h - pad),
         clampShort(pen.v + int(info.descent())), clampShort(pen.h + width + pad)};
+    // Only what the port has pixels for.
+    Rect bounds{}, box{};
+    Velmar::GetPortBounds(port, &bounds);
     Velmar::GrafPtr world = nullptr;
-    if (box.right > box.left && box.bottom > box.top
+    if (Velmar::SectRect(&text, &bounds, &box)
         && Velmar::NewGWorld(&world, 32, &box, nullptr, nullptr, 0) == Velmar::noErr && world) {
         Velmar::SetPort(world);
         Velmar::TextFont(r->txFont);
