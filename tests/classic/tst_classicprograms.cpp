@@ -241,7 +241,7 @@ private Q_SLOTS:
         Program p(QStringLiteral("offscreen"));
         // From the program's own memory: drawing landed as bits, its own writes survived a
         // drawing call, text drew, and the window's pixels copied back into a bitmap.
-        QCOMPARE(p.waitFor(QStringLiteral("row10")), QStringLiteral("row10 ffff000001"));
+        QCOMPARE(p.waitFor(QStringLiteral("row10")), QStringLiteral("row10 ffff 0000 1"));
         QCOMPARE(p.waitFor(QStringLiteral("direct")), QStringLiteral("direct 1 text 1"));
         QCOMPARE(p.waitFor(QStringLiteral("back")), QStringLiteral("back 2048"));
         const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));

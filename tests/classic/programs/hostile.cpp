@@ -205,8 +205,6 @@ private Q_SLOTS:
                     return long(bits[0]);
                 },
                 0, "bm != NULL"},
-            {"PlotIconID missing", [&] { return long(PlotIconID(&bounds, 0, 0, 999)); },
-                resNotFound, ""},
             {"PlotIconHandle made-up", [&] { return long(PlotIconHandle(&bounds, 0, 0, madeUp)); },
                 paramErr, "IsValidHandle(theIcon)"},
             {"DrawString without port",

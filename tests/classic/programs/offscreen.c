@@ -15,89 +15,72 @@ static BitMap offBits, backBits;
 
 static long SetBits(const BitMap* b)
 {
-    long n = 0;
-    int i, bit;
-    for (i = 0; i < b->rowBytes * (b->bounds.bottom - b->bounds.top); ++i)
-        for (bit = 0; bit < 8; ++bit)
-            n += (((unsigned char*)b->baseAddr)[i] >> bit) & 1;
+    long n = 0, i;
+    for (i = 0; i < 8L * b->rowBytes * (b->bounds.bottom - b->bounds.top); ++i)
+        n += (((unsigned char*)b->baseAddr)[i / 8] >> (i % 8)) & 1;
     return n;
+}
+
+static void NewBits(BitMap* b)
+{
+    b->baseAddr = NewPtrClear(8 * 64);
+    b->rowBytes = 8;
+    SetRect(&b->bounds, 0, 0, 64, 64);
 }
 
 static void DrawOffscreen(void)
 {
-    Rect r;
+    unsigned char* m;
+    Rect half, r;
     long before;
-    int directKept, i;
-    offBits.baseAddr = NewPtrClear(8 * 64);
-    offBits.rowBytes = 8;
-    SetRect(&offBits.bounds, 0, 0, 64, 64);
+    NewBits(&offBits);
+    m = (unsigned char*)offBits.baseAddr;
     OpenPort(&offPort);
     SetPortBits(&offBits);
-    ClipRect(&offBits.bounds);
     EraseRect(&offBits.bounds);
-    SetRect(&r, 0, 0, 32, 64); /* the left half black */
-    PaintRect(&r);
-    printf("row10 %02x%02x%02x%02x%02x\n", ((unsigned char*)offBits.baseAddr)[80],
-        ((unsigned char*)offBits.baseAddr)[83], ((unsigned char*)offBits.baseAddr)[84],
-        ((unsigned char*)offBits.baseAddr)[87], (unsigned)SetBits(&offBits) == 2048);
+    SetRect(&half, 0, 0, 32, 64); /* the left half black */
+    PaintRect(&half);
+    printf("row10 %02x%02x %02x%02x %d\n", m[80], m[83], m[84], m[87], SetBits(&offBits) == 2048);
     /* Bytes the program writes itself survive the next drawing call. */
-    memset(offBits.baseAddr + 8 * 60, 0xFF, 8);
+    memset(m + 8 * 60, 0xFF, 8);
     SetRect(&r, 40, 0, 48, 4);
     PaintRect(&r);
-    directKept = 1;
-    for (i = 0; i < 8; ++i)
-        directKept &= ((unsigned char*)offBits.baseAddr)[8 * 60 + i] == 0xFF;
-    /* Undo both: the bitmap is the left half again. */
-    memset(offBits.baseAddr + 8 * 60 + 4, 0, 4);
-    EraseRect(&r);
+    printf("direct %d", m[8 * 60 + 7] == 0xFF && m[8 * 60 + 4] == 0xFF);
     before = SetBits(&offBits);
     MoveTo(36, 40);
-    TextFont(systemFont);
-    TextSize(12);
     DrawString((ConstStr255Param)"\001W");
-    printf("direct %d text %d\n", directKept, SetBits(&offBits) > before);
+    printf(" text %d\n", SetBits(&offBits) > before);
     EraseRect(&offBits.bounds);
-    SetRect(&r, 0, 0, 32, 64);
-    PaintRect(&r);
+    PaintRect(&half);
 }
 
 static void Draw(WindowPtr w)
 {
-    Rect src, r;
+    static const short modes[] = {srcCopy, srcCopy, srcXor, srcBic, notSrcCopy};
+    static const Rect dst[] = {{10, 10, 74, 74}, {10, 90, 138, 218}, {10, 230, 74, 294},
+        {10, 310, 74, 374}, {150, 10, 214, 74}};
+    Rect r;
+    int i;
     SetPort(w);
     EraseRect(&w->portRect);
-    src = offBits.bounds;
-    SetRect(&r, 10, 10, 74, 74);
-    CopyBits(&offBits, &w->portBits, &src, &r, srcCopy, 0L);
-    SetRect(&r, 90, 10, 218, 138); /* scaled twice */
-    CopyBits(&offPort.portBits, &w->portBits, &src, &r, srcCopy, 0L);
-    SetRect(&r, 230, 10, 294, 74);
-    PaintRect(&r);
-    CopyBits(&offBits, &w->portBits, &src, &r, srcXor, 0L);
-    SetRect(&r, 310, 10, 374, 74);
-    PaintRect(&r);
-    CopyBits(&offBits, &w->portBits, &src, &r, srcBic, 0L);
-    SetRect(&r, 10, 150, 74, 214);
-    CopyBits(&offBits, &w->portBits, &src, &r, notSrcCopy, 0L);
+    for (i = 0; i < 5; ++i) { /* xor and bic over black; the second copy is scaled twice */
+        if (modes[i] == srcXor || modes[i] == srcBic)
+            PaintRect(&dst[i]);
+        CopyBits(i == 1 ? &offPort.portBits : &offBits, &w->portBits, &offBits.bounds, &dst[i],
+            modes[i], 0L);
+    }
     SetRect(&r, 90, 150, 122, 182); /* black under the icon: its mask's left half shows it */
     PaintRect(&r);
     PlotIconID(&r, atNone, ttNone, 128);
-    TextFont(systemFont);
     TextSize(24);
     TextMode(srcXor);
-    MoveTo(150, 240); /* twice: gone */
-    DrawString((ConstStr255Param)"\003WWW");
-    MoveTo(150, 240);
-    DrawString((ConstStr255Param)"\003WWW");
-    MoveTo(250, 240); /* once: there */
-    DrawString((ConstStr255Param)"\003WWW");
+    for (i = 0; i < 3; ++i) { /* twice at 150: gone; once at 250: there */
+        MoveTo(i < 2 ? 150 : 250, 240);
+        DrawString((ConstStr255Param)"\003WWW");
+    }
     TextMode(srcOr);
-    /* Window to bitmap: the first copy comes back. */
-    backBits.baseAddr = NewPtrClear(8 * 64);
-    backBits.rowBytes = 8;
-    SetRect(&backBits.bounds, 0, 0, 64, 64);
-    SetRect(&r, 10, 10, 74, 74);
-    CopyBits(&w->portBits, &backBits, &r, &backBits.bounds, srcCopy, 0L);
+    NewBits(&backBits); /* window to bitmap: the first copy comes back */
+    CopyBits(&w->portBits, &backBits, &dst[0], &backBits.bounds, srcCopy, 0L);
     printf("back %ld\n", SetBits(&backBits));
 }
 
@@ -106,8 +89,7 @@ int main(void)
     EventRecord e;
     WindowPtr w;
     Rect bounds;
-    Point tl;
-    int drawn = 0;
+    Point tl = {0, 0};
 
     InitGraf(&qd.thePort);
     InitFonts();
@@ -123,12 +105,10 @@ int main(void)
             BeginUpdate(w);
             Draw(w);
             EndUpdate(w);
-            if (!drawn++) {
-                SetPt(&tl, 0, 0);
-                LocalToGlobal(&tl);
-                printf("ready %d %d\n", tl.h, tl.v);
-                fflush(stdout);
-            }
+            LocalToGlobal(&tl);
+            printf("ready %d %d\n", tl.h, tl.v);
+            fflush(stdout);
+            SetPt(&tl, 0, 0);
         } else if (e.what == keyDown || e.what == mouseDown) {
             ClosePort(&offPort);
             return 0;
