@@ -36,7 +36,7 @@ static void DrawOffscreen(void)
     NewBits(&offBits);
     m = (unsigned char*)offBits.baseAddr;
     OpenPort(&offPort);
-    SetPortBits(&offBits);
+    offPort.portBits = offBits; /* as SetPortBits(&offBits) */
     EraseRect(&offBits.bounds);
     SetRect(&half, 0, 0, 32, 64); /* the left half black */
     PaintRect(&half);
