@@ -9,6 +9,7 @@
 #include "TextUtils.h"
 #include "Quickdraw.h"
 #include "Fonts.h"
+#include "Icons.h"
 #include "Events.h"
 #include "Controls.h"
 #include "Windows.h"

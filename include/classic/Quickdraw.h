@@ -284,6 +284,15 @@ VELMAR_CLASSIC_API void InvertPoly(PolyHandle poly);
 VELMAR_CLASSIC_API void FillPoly(PolyHandle poly, const Pattern* pat);
 VELMAR_CLASSIC_API void ScrollRect(const Rect* r, short dh, short dv, RgnHandle updateRgn);
 
+/* Bitmaps: a port's portBits (a window's, or a port on the program's own bitmap), the
+   screen (qd.screenBits) or a BitMap over the program's memory (1 bit a pixel, set = black). */
+VELMAR_CLASSIC_API void SetPortBits(const BitMap* bm);
+VELMAR_CLASSIC_API void CopyBits(const BitMap* srcBits, const BitMap* dstBits, const Rect* srcRect,
+                                 const Rect* dstRect, short mode, RgnHandle maskRgn);
+VELMAR_CLASSIC_API void CopyMask(const BitMap* srcBits, const BitMap* maskBits,
+                                 const BitMap* dstBits, const Rect* srcRect, const Rect* maskRect,
+                                 const Rect* dstRect);
+
 VELMAR_CLASSIC_API RgnHandle NewRgn(void);
 VELMAR_CLASSIC_API void DisposeRgn(RgnHandle rgn);
 VELMAR_CLASSIC_API void CopyRgn(RgnHandle src, RgnHandle dst);

@@ -69,6 +69,12 @@ struct PortLink {
     bool ownsStorage = false;
     bool colour = false;
     PortShadow shadow;
+    // A port that is no window draws into the program's own bitmap once its portBits name
+    // the program's memory (SetPortBits, or the record written directly): the library port
+    // is then the bitmap's size and the memory is kept in step with it (ProgramBits.cpp).
+    BitMap boundBits{}; // baseAddr null: not bound
+    QByteArray bitsSeen; // the bitmap's bytes as last read or written by the layer
+    std::vector<Velmar::UInt32> worldSeen; // the library port's pixels as last written back
     Velmar::GrafPtr port() const;
 };
 
@@ -94,6 +100,18 @@ void pushWindowRecord(PortLink& link);
 // Every window record's nextWindow, in the window list's order.
 void relinkWindowList();
 
+// ---- A program's own bitmaps (ProgramBits.cpp) ---------------------------------------------
+// Binds a port that is no window to the bitmap its portBits name (or unbinds it) and reads
+// the program's memory into the library port when the program changed it. pullPort calls it.
+void loadProgramBits(PortLink& link);
+// Writes the library port's pixels back into the program's bitmap (after each drawing call).
+void storeProgramBits(PortLink& link);
+bool boundToProgramBits(const PortLink& link);
+// CopyBits of a program's bitmap (its bounds whole) onto dstRect of the current port.
+void copyIntoCurrentPort(const Velmar::BitMap& bits, const Rect& dstRect, short mode);
+// The port whose record's portBits (or colour pixmap) is at `bits`; null for any other map.
+PortLink* portOfBits(const void* bits);
+
 // Runs a drawing call on the current port with the record's fields handed over first and the
 // pen written back afterwards. Does nothing without a current port.
 template <typename Call> void drawInPort(Call&& call)
@@ -104,6 +122,7 @@ template <typename Call> void drawInPort(Call&& call)
     pullPort(*link);
     call();
     pushPen(*link);
+    storeProgramBits(*link);
 }
 
 // Patterns given through the classic calls paint their set bits in the pen colour.

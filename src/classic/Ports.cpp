@@ -55,6 +55,14 @@ PortLink* windowLink(Velmar::AQtWindow* window)
     return it == windows().end() ? nullptr : it->second;
 }
 
+PortLink* portOfBits(const void* bits)
+{
+    for (const auto& [record, link] : ports())
+        if (bits == &record->portBits || (link->colour && bits == &link->pixMap))
+            return link;
+    return nullptr;
+}
+
 ::GrafPtr classicWindow(Velmar::AQtWindow* window)
 {
     PortLink* link = windowLink(window);
@@ -152,6 +160,7 @@ void releasePortRecord(PortLink& link)
 
 void pullPort(PortLink& link)
 {
+    loadProgramBits(link);
     GrafPort* r = link.record;
     PortShadow& s = link.shadow;
     if (!samePoint(r->pnLoc, s.pnLoc))
@@ -192,7 +201,9 @@ void pushPen(PortLink& link)
 void pushGeometry(PortLink& link)
 {
     Velmar::GrafPtr port = link.port();
-    if (!port)
+    // A port on the program's bitmap keeps the portRect and portBits the program gave it.
+    loadProgramBits(link);
+    if (!port || boundToProgramBits(link))
         return;
     GrafPort* r = link.record;
     Velmar::GetPortBounds(port, &r->portRect);
@@ -266,6 +277,8 @@ void OpenPort(GrafPtr port)
     auto* link = new PortLink;
     link->record = port;
     link->ownPort = Velmar::CreateNewPort();
+    // A new port covers the screen until the program gives it a bitmap of its own.
+    Velmar::SetPortBounds(link->ownPort, &globals()->screenBits.bounds);
     initPortRecord(*link, false);
     registerPort(link);
     SetPort(port);
@@ -301,6 +314,20 @@ void ClosePort(GrafPtr port)
 void SetOrigin(short h, short v)
 {
     if (PortLink* link = currentLink()) {
+        loadProgramBits(*link);
+        if (boundToProgramBits(*link)) {
+            // The bitmap's coordinates move with the port's, as the classic call moved
+            // portRect and portBits.bounds together.
+            GrafPort* r = link->record;
+            const short dh = short(h - r->portRect.left), dv = short(v - r->portRect.top);
+            Velmar::OffsetRect(&r->portRect, dh, dv);
+            Velmar::OffsetRect(&r->portBits.bounds, dh, dv);
+            link->boundBits.bounds = r->portBits.bounds;
+            Velmar::SetPortBounds(link->port(), &r->portBits.bounds);
+            pushRegions(*link);
+            pushPen(*link);
+            return;
+        }
         Velmar::SetOrigin(h, v);
         pushGeometry(*link);
         pushRegions(*link);
@@ -311,6 +338,13 @@ void SetOrigin(short h, short v)
 void PortSize(short width, short height)
 {
     if (PortLink* link = currentLink()) {
+        loadProgramBits(*link);
+        if (boundToProgramBits(*link)) {
+            // The bitmap keeps its size; only the record's rectangle changes.
+            link->record->portRect.right = short(link->record->portRect.left + width);
+            link->record->portRect.bottom = short(link->record->portRect.top + height);
+            return;
+        }
         Velmar::PortSize(width, height);
         pushGeometry(*link);
     }

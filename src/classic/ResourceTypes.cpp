@@ -1,6 +1,7 @@
 // Calls that read one resource type: strings, string lists, cursors, patterns, icons and
-// pictures. Records programs read field by field (a cursor, a picture's frame) are put in the
-// machine's byte order in their handle; the rest stays in the file's bytes.
+// pictures (icons are plotted in Icons.cpp). Records programs read field by field (a cursor, a
+// picture's frame) are put in the machine's byte order in their handle; the rest stays in the
+// file's bytes.
 #include "classic/ClassicPrivate.h"
 
 #include "classic/resfile/Decoders.h"
@@ -171,29 +172,4 @@ void KillPicture(PicHandle myPicture)
 Handle GetIcon(short iconID)
 {
     return GetResource('ICON', iconID);
-}
-
-void PlotIcon(const Rect* theRect, Handle theIcon)
-{
-    if (!VELMAR_ASSERT(theRect, "theRect != NULL")
-        || !VELMAR_ASSERT(isLiveHandle(theIcon), "IsValidHandle(theIcon)"))
-        return;
-    const QByteArray bits = handleBytes(theIcon);
-    if (bits.size() < 128)
-        return;
-    // Each of the 32 x 32 bits fills its share of the rectangle: set bits in the foreground
-    // colour, clear bits in the background colour.
-    drawInPort([&] {
-        Velmar::EraseRect(theRect);
-        const int width = theRect->right - theRect->left, height = theRect->bottom - theRect->top;
-        for (int row = 0; row < 32; ++row)
-            for (int col = 0; col < 32; ++col)
-                if (Velmar::UInt8(bits[row * 4 + col / 8]) & (0x80 >> (col % 8))) {
-                    const Rect cell{short(theRect->top + row * height / 32),
-                        short(theRect->left + col * width / 32),
-                        short(theRect->top + (row + 1) * height / 32),
-                        short(theRect->left + (col + 1) * width / 32)};
-                    Velmar::PaintRect(&cell);
-                }
-    });
 }

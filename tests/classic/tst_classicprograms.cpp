@@ -236,6 +236,53 @@ private Q_SLOTS:
         QCOMPARE(p.waitFor(QStringLiteral("tracked")), QStringLiteral("tracked 240 200"));
     }
 
+    void offscreenBitsAndIcons()
+    {
+        Program p(QStringLiteral("offscreen"));
+        // From the program's own memory: drawing landed as bits, its own writes survived a
+        // drawing call, text drew, and the window's pixels copied back into a bitmap.
+        QCOMPARE(p.waitFor(QStringLiteral("row10")), QStringLiteral("row10 ffff 0000 1"));
+        QCOMPARE(p.waitFor(QStringLiteral("direct")), QStringLiteral("direct 1 text 1"));
+        QCOMPARE(p.waitFor(QStringLiteral("back")), QStringLiteral("back 2048"));
+        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
+        QCOMPARE(o.size(), 2);
+        const QPoint origin(o[0], o[1]);
+        m_x.moveTo(origin + QPoint(390, 290));
+        const QImage shot = screen();
+        struct Case {
+            const char* what;
+            QRect local;
+            double minDark, maxDark;
+        };
+        // The bitmap is black on its left half; each copy shows it through its mode.
+        const Case cases[] = {
+            {"srcCopy", QRect(12, 12, 28, 60), 0.99, 1.0},
+            {"srcCopy right", QRect(44, 12, 28, 60), 0.0, 0.01},
+            {"scaled", QRect(92, 12, 60, 124), 0.99, 1.0},
+            {"scaled right", QRect(156, 12, 60, 124), 0.0, 0.01},
+            {"srcXor on black", QRect(232, 12, 28, 60), 0.0, 0.01},
+            {"srcXor beside", QRect(264, 12, 28, 60), 0.99, 1.0},
+            {"srcBic", QRect(312, 12, 28, 60), 0.0, 0.01},
+            {"srcBic beside", QRect(344, 12, 28, 60), 0.99, 1.0},
+            {"notSrcCopy", QRect(12, 152, 28, 60), 0.0, 0.01},
+            {"notSrcCopy right", QRect(44, 152, 28, 60), 0.99, 1.0},
+            {"icon over mask", QRect(91, 151, 14, 14), 0.99, 1.0},
+            {"mask without icon", QRect(91, 167, 14, 14), 0.0, 0.01},
+            {"outside the mask", QRect(107, 151, 14, 30), 0.99, 1.0},
+            {"srcXor text twice", QRect(148, 215, 80, 32), 0.0, 0.0},
+            {"srcXor text once", QRect(248, 215, 80, 32), 0.05, 0.6},
+        };
+        for (const Case& c : cases) {
+            const double share = darkShare(shot, c.local.translated(origin));
+            QVERIFY2(share >= c.minDark && share <= c.maxDark,
+                qPrintable(QStringLiteral("%1: %2").arg(QLatin1String(c.what)).arg(share)));
+        }
+        m_x.tap(kKeyQ);
+        int code = -1;
+        QVERIFY(p.finished(&code));
+        QCOMPARE(code, 0);
+    }
+
     void gameLoop()
     {
         Program p(QStringLiteral("gameloop"));

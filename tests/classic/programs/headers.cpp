@@ -11,6 +11,7 @@
 #include <Quickdraw.h>
 #include <QuickDraw.h>
 #include <Fonts.h>
+#include <Icons.h>
 #include <Events.h>
 #include <Controls.h>
 #include <Windows.h>

@@ -168,6 +168,45 @@ private Q_SLOTS:
                     return Random();
                 },
                 16807, ""},
+            {"CopyBits null map",
+                [&] {
+                    CopyBits(nullptr, &qd.screenBits, &bounds, &bounds, srcCopy, nullptr);
+                    return 0L;
+                },
+                0, "srcBits && dstBits"},
+            {"CopyBits made-up and extreme maps",
+                [&] {
+                    static char bits[8 * 8];
+                    BitMap small = {bits, 1, {0, 0, 8, 8}};
+                    BitMap thin = {bits, 1, {0, 0, 8, 64}}; // rowBytes too small for 64
+                    BitMap huge = {bits, 8, {-32000, -32000, 32000, 32000}};
+                    const Rect extreme = {-32768, -32768, 32767, 32767};
+                    CopyBits(&small, &thin, &extreme, &extreme, srcXor, nullptr);
+                    CopyBits(&huge, &small, &extreme, &bounds, srcCopy, nullptr);
+                    CopyBits(&small, &small, &extreme, &bounds, notSrcBic, nullptr);
+                    CopyBits(&qd.screenBits, &small, &bounds, &bounds, srcCopy, nullptr);
+                    CopyMask(&small, &small, &huge, &extreme, &extreme, &extreme);
+                    return long(bits[0] == 0);
+                },
+                1, ""},
+            {"Port on a made-up bitmap draws nowhere",
+                [&] {
+                    static GrafPort port;
+                    static char bits[8];
+                    OpenPort(&port);
+                    BitMap wide = {bits, 8, {0, 0, 30000, 30000}};
+                    SetPortBits(&wide);
+                    PaintRect(&bounds);
+                    TextMode(srcXor);
+                    MoveTo(32000, 32000);
+                    DrawString((const unsigned char*)"\1x");
+                    SetPortBits(nullptr);
+                    ClosePort(&port);
+                    return long(bits[0]);
+                },
+                0, "bm != NULL"},
+            {"PlotIconHandle made-up", [&] { return long(PlotIconHandle(&bounds, 0, 0, madeUp)); },
+                paramErr, "IsValidHandle(theIcon)"},
             {"DrawString without port",
                 [] {
                     DrawString((const unsigned char*)"\1x");
