@@ -98,8 +98,10 @@ void QD_BitMapToRegion256(benchmark::State& state)
 
 BENCHMARK(QD_CopyBits256)->Name("QD/CopyBits256");
 BENCHMARK(Qt_DrawImage256)->Name("Qt/CopyBits256");
-BENCHMARK(QD_CopyBitsScaled2x)->Name("QD/CopyBitsScaled2x");
-BENCHMARK(Qt_DrawImageScaled2x)->Name("Qt/CopyBitsScaled2x");
+// Qt's raster engine spreads a large scaled draw over its thread pool: the CPU time that
+// counts is the whole process's, not the calling thread's.
+BENCHMARK(QD_CopyBitsScaled2x)->Name("QD/CopyBitsScaled2x")->MeasureProcessCPUTime();
+BENCHMARK(Qt_DrawImageScaled2x)->Name("Qt/CopyBitsScaled2x")->MeasureProcessCPUTime();
 BENCHMARK(QD_BitMapToRegion256)->Name("QD/BitMapToRegion256");
 
 VELMAR_BENCHMARK_MAIN()
