@@ -6,6 +6,8 @@
 #define VELMAR_CLASSIC_SHARES_RECT 1
 #include <ClassicToolbox.h>
 
+#include <QFile>
+#include <QTemporaryDir>
 #include <QTest>
 
 #include <climits>
@@ -55,6 +57,34 @@ private Q_SLOTS:
         WindowPtr goneWindow = NewWindow(
             nullptr, &bounds, (const unsigned char*)"\1w", false, 0, (WindowPtr)-1L, true, 0);
         DisposeWindow(goneWindow);
+        WindowPtr textWindow = NewWindow(
+            nullptr, &bounds, (const unsigned char*)"\1t", false, 0, (WindowPtr)-1L, false, 0);
+        SetPort(textWindow);
+        TEHandle styled = TEStyleNew(&bounds, &bounds);
+        TEHandle plain = TENew(&bounds, &bounds);
+        TEHandle goneTE = TENew(&bounds, &bounds);
+        TEDispose(goneTE);
+        // A 'styl' scrap claiming more runs than it holds, and one with a negative count.
+        const auto scrap = [](std::initializer_list<unsigned char> bytes) {
+            Handle h = NewHandle(Size(bytes.size()));
+            std::copy(bytes.begin(), bytes.end(), reinterpret_cast<unsigned char*>(*h));
+            return reinterpret_cast<StScrpHandle>(h);
+        };
+        StScrpHandle truncated = scrap({0, 9, 0, 0, 0, 0, 0, 16, 0, 12, 0, 0, 1, 0, 0, 12, 0, 0,
+            0, 0, 0, 0, 0, 0, 0, 3});
+        StScrpHandle negative = scrap({0x80, 0});
+        QTemporaryDir folder;
+        const QByteArray dataFile = folder.filePath(QStringLiteral("data")).toLocal8Bit();
+        QFile data(QString::fromLocal8Bit(dataFile));
+        data.open(QIODevice::WriteOnly);
+        data.write("the program's own data");
+        data.close();
+        const auto pstr = [](const QByteArray& text) {
+            static unsigned char s[256];
+            s[0] = (unsigned char)std::min<qsizetype>(text.size(), 255);
+            std::memcpy(s + 1, text.constData(), s[0]);
+            return s;
+        };
         const Case cases[] = {
             {"DisposeRgn made-up",
                 [&] {
@@ -168,6 +198,134 @@ private Q_SLOTS:
                     return Random();
                 },
                 16807, ""},
+            {"TEStyleInsert truncated styl",
+                [&] {
+                    TEStyleInsert("abcdef", 6, truncated, styled);
+                    return long((**styled).teLength);
+                },
+                6, ""},
+            {"TEStyleInsert negative count",
+                [&] {
+                    TEStyleInsert("gh", 2, negative, styled);
+                    return long((**styled).teLength);
+                },
+                8, ""},
+            {"TEStyleInsert made-up scrap",
+                [&] {
+                    TEStyleInsert("x", 1, reinterpret_cast<StScrpHandle>(junk), styled);
+                    return long((**styled).teLength);
+                },
+                8, "IsValidHandle(hST)"},
+            {"TEGetStyle disposed record",
+                [&] {
+                    TextStyle style{};
+                    TEGetStyle(0, &style, nullptr, nullptr, goneTE);
+                    return long(style.tsSize);
+                },
+                0, "IsValidTEHandle(hTE)"},
+            {"TESetStyle null style",
+                [&] {
+                    TESetStyle(doFace, nullptr, true, styled);
+                    return 0L;
+                },
+                0, "newStyle != NULL"},
+            {"TEGetStyleScrapHandle plain record",
+                [&] { return long(TEGetStyleScrapHandle(plain) != nullptr); }, 0, ""},
+            {"SetClikLoop null record",
+                [&] {
+                    SetClikLoop(nullptr, nullptr);
+                    return 0L;
+                },
+                0, "hTE != NULL"},
+            {"AddResource null",
+                [] {
+                    AddResource(nullptr, 'TEXT', 128, nullptr);
+                    return long(ResError());
+                },
+                addResFailed, ""},
+            {"AddResource made-up handle",
+                [&] {
+                    AddResource(madeUp, 'TEXT', 128, nullptr);
+                    return long(ResError());
+                },
+                addResFailed, ""},
+            {"RemoveResource plain handle",
+                [] {
+                    Handle h = NewHandle(1);
+                    RemoveResource(h);
+                    DisposeHandle(h);
+                    return long(ResError());
+                },
+                rmvResFailed, ""},
+            {"ChangedResource disposed",
+                [&] {
+                    ChangedResource(goneHandle);
+                    return long(ResError());
+                },
+                resNotFound, ""},
+            {"WriteResource null",
+                [] {
+                    WriteResource(nullptr);
+                    return long(ResError());
+                },
+                resNotFound, ""},
+            {"SetResInfo made-up",
+                [&] {
+                    SetResInfo(madeUp, 1, nullptr);
+                    return long(ResError());
+                },
+                resNotFound, ""},
+            {"UpdateResFile unknown",
+                [] {
+                    UpdateResFile(999);
+                    return long(ResError());
+                },
+                resFNotFound, ""},
+            {"CreateResFile null",
+                [] {
+                    CreateResFile(nullptr);
+                    return 0L;
+                },
+                0, "fileName != NULL"},
+            {"CreateResFile empty name",
+                [] {
+                    CreateResFile((const unsigned char*)"");
+                    return long(ResError());
+                },
+                paramErr, ""},
+            {"CreateResFile in no folder",
+                [&] {
+                    CreateResFile(pstr("/nonexistent/folder/x"));
+                    return long(ResError());
+                },
+                dirNFErr, ""},
+            {"CreateResFile over a data file keeps the data",
+                [&] {
+                    CreateResFile(pstr(dataFile));
+                    QFile back(QString::fromLocal8Bit(dataFile));
+                    back.open(QIODevice::ReadOnly);
+                    return long(ResError()) * 10 + (back.readAll() == "the program's own data")
+                        + 2 * QFile::exists(QString::fromLocal8Bit(dataFile + ".rsrc"));
+                },
+                3, ""},
+            {"SetResLoad false gives an empty handle",
+                [&] {
+                    const short ref = OpenResFile(pstr(dataFile));
+                    UseResFile(ref);
+                    Handle h = NewHandle(3);
+                    AddResource(h, 'DATA', 5, nullptr);
+                    UpdateResFile(ref);
+                    ReleaseResource(h);
+                    SetResLoad(false);
+                    h = Get1Resource('DATA', 5);
+                    SetResLoad(true);
+                    const long empty = h && *h == nullptr;
+                    LoadResource(h);
+                    const long loaded = h && *h && GetHandleSize(h) == 3;
+                    CloseResFile(ref);
+                    return empty * 10 + loaded;
+                },
+                11, ""},
             {"DrawString without port",
                 [] {
                     DrawString((const unsigned char*)"\1x");
