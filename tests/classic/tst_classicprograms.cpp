@@ -128,7 +128,7 @@ private Q_SLOTS:
             "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1", "windowKind=8",
             "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7", "secondBehindFirst=1",
             "contRgnWidth=300", "GetWRefCon=99", "pnLocAfterMove=35045", "txSize=18",
-            "rgnRect=1011070", "rgnOvalComplex=1", "random1=16807", "seedAfter=16807",
+            "rgnRect=1011070", "rgnOvalComplex=1", "rgnScanLines=1", "random1=16807", "seedAfter=16807",
             "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101", "shortDateLength=6",
             "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1", "locked=1",
             "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
