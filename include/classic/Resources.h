@@ -14,10 +14,10 @@ enum {
 enum { fsCurPerm = 0, fsRdPerm = 1, fsWrPerm = 2, fsRdWrPerm = 3, fsRdWrShPerm = 4 };
 
 VELMAR_CLASSIC_API short OpenResFile(ConstStr255Param fileName);
-VELMAR_CLASSIC_API short OpenRFPerm(ConstStr255Param fileName, short vRefNum,
-                                    SignedByte permission);
-VELMAR_CLASSIC_API short HOpenResFile(short vRefNum, long dirID, ConstStr255Param fileName,
-                                      SignedByte permission);
+VELMAR_CLASSIC_API short OpenRFPerm(
+    ConstStr255Param fileName, short vRefNum, SignedByte permission);
+VELMAR_CLASSIC_API short HOpenResFile(
+    short vRefNum, long dirID, ConstStr255Param fileName, SignedByte permission);
 VELMAR_CLASSIC_API void CloseResFile(short refNum);
 VELMAR_CLASSIC_API void UseResFile(short refNum);
 VELMAR_CLASSIC_API short CurResFile(void);
@@ -49,8 +49,8 @@ VELMAR_CLASSIC_API void DetachResource(Handle theResource);
    data (MacBinary, AppleSingle/AppleDouble), are not written: ResError says wrPermErr. */
 VELMAR_CLASSIC_API void CreateResFile(ConstStr255Param fileName);
 VELMAR_CLASSIC_API void HCreateResFile(short vRefNum, long dirID, ConstStr255Param fileName);
-VELMAR_CLASSIC_API void AddResource(Handle theData, ResType theType, short theID,
-                                    ConstStr255Param name);
+VELMAR_CLASSIC_API void AddResource(
+    Handle theData, ResType theType, short theID, ConstStr255Param name);
 VELMAR_CLASSIC_API void ChangedResource(Handle theResource);
 VELMAR_CLASSIC_API void WriteResource(Handle theResource);
 VELMAR_CLASSIC_API void UpdateResFile(short refNum);

@@ -120,13 +120,13 @@ VELMAR_CLASSIC_API long TEGetHeight(long endLine, long startLine, TEHandle hTE);
 VELMAR_CLASSIC_API void TEPinScroll(short dh, short dv, TEHandle hTE);
 
 /* Styles: in styled records only (plain records keep one style). */
-VELMAR_CLASSIC_API void TEStyleInsert(const void* text, long length, StScrpHandle hST,
-                                      TEHandle hTE);
+VELMAR_CLASSIC_API void TEStyleInsert(
+    const void* text, long length, StScrpHandle hST, TEHandle hTE);
 VELMAR_CLASSIC_API void TEStylePaste(TEHandle hTE);
-VELMAR_CLASSIC_API void TESetStyle(short mode, const TextStyle* newStyle, Boolean fRedraw,
-                                   TEHandle hTE);
-VELMAR_CLASSIC_API void TEGetStyle(short offset, TextStyle* theStyle, short* lineHeight,
-                                   short* fontAscent, TEHandle hTE);
+VELMAR_CLASSIC_API void TESetStyle(
+    short mode, const TextStyle* newStyle, Boolean fRedraw, TEHandle hTE);
+VELMAR_CLASSIC_API void TEGetStyle(
+    short offset, TextStyle* theStyle, short* lineHeight, short* fontAscent, TEHandle hTE);
 /* The selection's styles as a new handle the program disposes; null for a plain record. */
 VELMAR_CLASSIC_API StScrpHandle TEGetStyleScrapHandle(TEHandle hTE);
 

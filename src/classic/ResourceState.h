@@ -14,8 +14,8 @@ namespace VelmarClassic {
 struct OpenFile {
     short refNum = 0;
     Velmar::Classic::ResourceFork fork;
-    QString path;       // the name it was opened by (absolute)
-    QString forkPath;   // the file the fork is in
+    QString path; // the name it was opened by (absolute)
+    QString forkPath; // the file the fork is in
     bool writable = false; // a raw fork opened for writing
     bool mapChanged = false;
 };

@@ -140,8 +140,10 @@ void CreateResFile(ConstStr255Param fileName)
     }
     QSaveFile out(path);
     const QByteArray empty = ResourceFork().serialize();
-    const bool ok = out.open(QIODevice::WriteOnly) && out.write(empty) == empty.size() && out.commit();
-    s.error = ok ? noErr : (QFileInfo(QFileInfo(path).absolutePath()).isDir() ? wrPermErr : dirNFErr);
+    const bool ok =
+        out.open(QIODevice::WriteOnly) && out.write(empty) == empty.size() && out.commit();
+    s.error =
+        ok ? noErr : (QFileInfo(QFileInfo(path).absolutePath()).isDir() ? wrPermErr : dirNFErr);
 }
 
 void HCreateResFile(short, long, ConstStr255Param fileName)
@@ -214,7 +216,7 @@ void UpdateResFile(short refNum)
         return;
     }
     OpenFile& file = state().files[size_t(i)];
-    state().error = file.mapChanged ? writeResourceFile(file) : noErr;
+    state().error = file.mapChanged ? writeResourceFile(file) : OSErr(noErr);
 }
 
 void RemoveResource(Handle theResource)

@@ -93,8 +93,8 @@ void TEStyleInsert(const void* text, long length, StScrpHandle hST, TEHandle hTE
     const std::vector<Velmar::ScrpSTElement> runs =
         styles ? runsOf(handleBytes(styles)) : std::vector<Velmar::ScrpSTElement>{};
     const size_t count = runs.size();
-    std::vector<char> storage(
-        offsetof(Velmar::StScrpRec, scrpStyleTab) + std::max<size_t>(count, 1) * sizeof(Velmar::ScrpSTElement));
+    std::vector<char> storage(offsetof(Velmar::StScrpRec, scrpStyleTab)
+        + std::max<size_t>(count, 1) * sizeof(Velmar::ScrpSTElement));
     auto* scrap = reinterpret_cast<Velmar::StScrpRec*>(storage.data());
     scrap->scrpNStyles = Velmar::SInt16(count);
     std::copy(runs.begin(), runs.end(), scrap->scrpStyleTab);

