@@ -169,6 +169,13 @@ void forgetResourceHandle(Handle h)
     const auto it = s.loaded.find(h);
     if (it == s.loaded.end())
         return;
+    // A changed resource keeps the handle's bytes for the next write: releasing, detaching or
+    // disposing of its handle first loses nothing.
+    const int i = indexOf(it->second.file);
+    ResourceEntry* entry =
+        i < 0 ? nullptr : s.files[size_t(i)].fork.find(UInt32(it->second.type), it->second.id);
+    if (entry && (entry->attributes & Velmar::Classic::kResChanged) && *h)
+        entry->data = handleBytes(h);
     s.byKey.erase(std::make_tuple(it->second.file, it->second.type, it->second.id));
     s.loaded.erase(it);
     markResourceHandle(h, false);

@@ -52,9 +52,10 @@ static void WriteAndReadBack(StScrpHandle scrap)
     AddResource(h, 'TEXT', 201, "\pagain");
     Show("addedTwice", ResError());
     AddResource((Handle)scrap, 'styl', 200, "\p");
-    /* A change after adding reaches the file too. */
+    /* A change after adding reaches the file too, even with its handle released first. */
     (*h)[0] = 'j';
     ChangedResource(h);
+    ReleaseResource(h);
     UpdateResFile(ref);
     Show("updated", ResError());
     h = Get1Resource('TEXT', 200);
