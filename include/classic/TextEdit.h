@@ -46,6 +46,50 @@ typedef struct TERec {
 typedef TERec* TEPtr;
 typedef TEPtr* TEHandle;
 
+/* TESetStyle modes. */
+enum { doFont = 1, doFace = 2, doSize = 4, doColor = 8, doAll = 15, addSize = 16, doToggle = 32 };
+
+typedef struct TextStyle {
+    short tsFont;
+    Style tsFace;
+    char filler;
+    short tsSize;
+    RGBColor tsColor;
+} TextStyle;
+typedef TextStyle* TextStylePtr;
+typedef TextStylePtr* TextStyleHandle;
+
+/* A style scrap as a 'styl' resource holds it: a count, then 20-byte runs, in the resource's
+   (big-endian) byte order, with two-byte alignment. The handles the calls take and make are
+   in this form, so a 'styl' resource and a scrap from TEGetStyleScrapHandle are one thing. */
+#pragma pack(push, 2)
+typedef struct ScrpSTElement {
+    int scrpStartChar; /* 32 bits, as the resource has it */
+    short scrpHeight;
+    short scrpAscent;
+    short scrpFont;
+    Style scrpFace;
+    char filler;
+    short scrpSize;
+    RGBColor scrpColor;
+} ScrpSTElement;
+typedef struct StScrpRec {
+    short scrpNStyles;
+    ScrpSTElement scrpStyleTab[1];
+} StScrpRec;
+#pragma pack(pop)
+typedef StScrpRec* StScrpPtr;
+typedef StScrpPtr* StScrpHandle;
+
+/* Hooks a program installs. The click loop runs again and again while TEClick tracks the
+   mouse (false stops the tracking); it is given the record (programs that declare it without
+   arguments ignore it). The word-break procedure answers whether the character at charPos
+   breaks words; a double click selects the run around the click that it classes alike. */
+typedef pascal Boolean (*TEClickLoopProcPtr)(TEPtr pTE);
+typedef TEClickLoopProcPtr TEClickLoopUPP;
+typedef pascal Boolean (*WordBreakProcPtr)(Ptr text, short charPos);
+typedef WordBreakProcPtr WordBreakUPP;
+
 VELMAR_CLASSIC_API void TEInit(void);
 VELMAR_CLASSIC_API TEHandle TENew(const Rect* destRect, const Rect* viewRect);
 VELMAR_CLASSIC_API TEHandle TEStyleNew(const Rect* destRect, const Rect* viewRect);
@@ -71,11 +115,39 @@ VELMAR_CLASSIC_API void TESelView(TEHandle hTE);
 VELMAR_CLASSIC_API void TEAutoView(Boolean fAuto, TEHandle hTE);
 VELMAR_CLASSIC_API void TECalText(TEHandle hTE);
 VELMAR_CLASSIC_API short TEGetOffset(Point pt, TEHandle hTE);
+VELMAR_CLASSIC_API Point TEGetPoint(short offset, TEHandle hTE);
+VELMAR_CLASSIC_API long TEGetHeight(long endLine, long startLine, TEHandle hTE);
+VELMAR_CLASSIC_API void TEPinScroll(short dh, short dv, TEHandle hTE);
+
+/* Styles: in styled records only (plain records keep one style). */
+VELMAR_CLASSIC_API void TEStyleInsert(
+    const void* text, long length, StScrpHandle hST, TEHandle hTE);
+VELMAR_CLASSIC_API void TEStylePaste(TEHandle hTE);
+VELMAR_CLASSIC_API void TESetStyle(
+    short mode, const TextStyle* newStyle, Boolean fRedraw, TEHandle hTE);
+VELMAR_CLASSIC_API void TEGetStyle(
+    short offset, TextStyle* theStyle, short* lineHeight, short* fontAscent, TEHandle hTE);
+/* The selection's styles as a new handle the program disposes; null for a plain record. */
+VELMAR_CLASSIC_API StScrpHandle TEGetStyleScrapHandle(TEHandle hTE);
+
+VELMAR_CLASSIC_API void TESetClickLoop(TEClickLoopUPP clikProc, TEHandle hTE);
+VELMAR_CLASSIC_API void SetClikLoop(ProcPtr clikProc, TEHandle hTE);
+VELMAR_CLASSIC_API void TESetWordBreak(WordBreakUPP wBrkProc, TEHandle hTE);
+VELMAR_CLASSIC_API void SetWordBreak(ProcPtr wBrkProc, TEHandle hTE);
+
+#define NewTEClickLoopUPP(proc) ((TEClickLoopUPP)(proc))
+#define DisposeTEClickLoopUPP(upp) ((void)(upp))
+#define NewWordBreakUPP(proc) ((WordBreakUPP)(proc))
+#define DisposeWordBreakUPP(upp) ((void)(upp))
 
 /* Later names of the same calls. */
 #if !defined(VELMAR_CLASSIC_IMPLEMENTATION)
 #define TextBox TETextBox
 #define TESetJust TESetAlignment
+#define TEStylNew TEStyleNew
+#define TEStylInsert TEStyleInsert
+#define TEStylPaste TEStylePaste
+#define GetStylScrap TEGetStyleScrapHandle
 #endif
 
 VELMAR_CLASSIC_END

@@ -120,8 +120,16 @@ enum {
     resNotFound = -192,
     resFNotFound = -193,
     addResFailed = -194,
+    rmvResFailed = -196,
+    resAttrErr = -198,
     mapReadErr = -199,
+    ioErr = -36,
+    dirNFErr = -120,
     fnfErr = -43,
+    dupFNErr = -48,
+    opWrErr = -49,
+    permErr = -54,
+    wrPermErr = -61,
     userCanceledErr = -128
 };
 

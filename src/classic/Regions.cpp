@@ -1,16 +1,73 @@
-// Classic regions: a handle to a record with rgnSize and rgnBBox, kept in step with the
-// library region behind it after every call that changes it.
+// Classic regions: a handle to a record with rgnSize and rgnBBox and, for any shape but a
+// rectangle, the classic scan-line data after them, kept in step with the library region
+// behind it after every call that changes it.
 #include "classic/ClassicPrivate.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <cstring>
 
 namespace VelmarClassic {
 
 namespace {
 
 struct RegionBlock {
-    Region* master = nullptr;
-    Region record{};
+    Region* master = nullptr; // the record, then the scan lines (malloc'd)
     Velmar::RgnHandle region = nullptr;
 };
+
+constexpr short kEndMark = 0x7fff;
+constexpr size_t kHeaderBytes = 10;
+
+// The classic scan-line data: for each line where the region's extent changes, its v, the h
+// of every point where the change begins or ends (in order), and the end mark; then the end
+// mark. A point is where membership differs between this line and the one above it: the
+// edges of the two lines' spans that do not cancel.
+std::vector<short> scanLines(const QRegion& region)
+{
+    struct Band {
+        int top, bottom;
+        std::vector<int> edges;
+    };
+    std::vector<Band> bands;
+    for (const QRect& r : region) { // Qt gives the rectangles in bands, top to bottom
+        if (bands.empty() || bands.back().top != r.top())
+            bands.push_back({r.top(), r.bottom() + 1, {}});
+        bands.back().edges.push_back(r.left());
+        bands.back().edges.push_back(r.right() + 1);
+    }
+    std::vector<short> out;
+    std::vector<int> above;
+    const auto line = [&](int v, const std::vector<int>& now) {
+        std::vector<int> all = above;
+        all.insert(all.end(), now.begin(), now.end());
+        std::sort(all.begin(), all.end());
+        std::vector<int> points;
+        for (size_t i = 0; i < all.size();) {
+            size_t j = i;
+            while (j < all.size() && all[j] == all[i])
+                ++j;
+            if ((j - i) % 2)
+                points.push_back(all[i]);
+            i = j;
+        }
+        if (!points.empty()) {
+            out.push_back(short(v));
+            for (int h : points)
+                out.push_back(short(h));
+            out.push_back(kEndMark);
+        }
+        above = now;
+    };
+    for (size_t i = 0; i < bands.size(); ++i) {
+        line(bands[i].top, bands[i].edges);
+        // A gap below the band (or the end) brings the line back to nothing.
+        if (i + 1 == bands.size() || bands[i + 1].top != bands[i].bottom)
+            line(bands[i].bottom, {});
+    }
+    out.push_back(kEndMark);
+    return out;
+}
 
 std::unordered_map<::RgnHandle, RegionBlock*>& regions()
 {
@@ -23,9 +80,9 @@ std::unordered_map<::RgnHandle, RegionBlock*>& regions()
 ::RgnHandle newClassicRegion()
 {
     auto* block = new RegionBlock;
-    block->master = &block->record;
+    block->master = static_cast<Region*>(std::calloc(1, sizeof(Region)));
     block->region = Velmar::NewRgn();
-    block->record.rgnSize = 10;
+    block->master->rgnSize = 10;
     const ::RgnHandle h = &block->master;
     regions()[h] = block;
     return h;
@@ -48,15 +105,26 @@ void syncRegion(::RgnHandle rgn)
         return;
     RegionBlock* block = it->second;
     const QRect b = block->region->boundingRect();
-    Region& r = block->record;
-    if (b.isEmpty())
-        r.rgnBBox = Rect{0, 0, 0, 0};
-    else
-        r.rgnBBox =
-            Rect{short(b.top()), short(b.left()), short(b.bottom() + 1), short(b.right() + 1)};
-    // A rectangle is the bare record; other shapes carry their scan lines after it.
-    const int rects = block->region->rectCount();
-    r.rgnSize = rects <= 1 ? 10 : (unsigned short)std::min(32000, 10 + rects * 8 + 2);
+    Rect box{0, 0, 0, 0};
+    if (!b.isEmpty())
+        box = Rect{short(b.top()), short(b.left()), short(b.bottom() + 1), short(b.right() + 1)};
+    // A rectangle is the bare record; other shapes carry their scan lines after it (all of
+    // them, though rgnSize says at most 32766).
+    std::vector<short> lines;
+    if (block->region->rectCount() > 1)
+        lines = scanLines(*block->region);
+    const size_t bytes = std::max(sizeof(Region), kHeaderBytes + lines.size() * sizeof(short));
+    auto* grown = static_cast<Region*>(std::realloc(block->master, bytes));
+    if (!grown)
+        return;
+    block->master = grown;
+    grown->rgnBBox = box;
+    grown->rgnSize = (unsigned short)(lines.empty()
+            ? 10
+            : std::min<size_t>(32766, kHeaderBytes + lines.size() * sizeof(short)));
+    if (!lines.empty())
+        std::memcpy(reinterpret_cast<char*>(grown) + kHeaderBytes, lines.data(),
+            lines.size() * sizeof(short));
 }
 
 void setRegion(::RgnHandle rgn, const QRegion& region)
@@ -104,6 +172,7 @@ void DisposeRgn(RgnHandle rgn)
     if (!VELMAR_ASSERT(it != regions().end(), "IsValidRgnHandle(rgn)"))
         return;
     Velmar::DisposeRgn(it->second->region);
+    std::free(it->second->master);
     delete it->second;
     regions().erase(it);
 }

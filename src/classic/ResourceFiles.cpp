@@ -3,7 +3,7 @@
 // resource holding its raw bytes.
 #include "classic/ClassicPrivate.h"
 
-#include "classic/resfile/ResourceFork.h"
+#include "classic/ResourceState.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -17,47 +17,34 @@
 
 namespace VelmarClassic {
 
-namespace {
-
 using Velmar::Classic::ResourceEntry;
 using Velmar::Classic::ResourceFork;
 
-struct OpenFile {
-    short refNum = 0;
-    ResourceFork fork;
-    QString path;
-};
-
-struct Loaded {
-    short file = 0;
-    ResType type = 0;
-    short id = 0;
-};
-
-struct State {
-    std::vector<OpenFile> files; // in opening order: the search goes from the current down
-    short current = 0;
-    short nextRef = 1;
-    OSErr error = noErr;
-    bool load = true;
-    QString programFile;
-    std::unordered_map<Handle, Loaded> loaded;
-    std::map<std::tuple<short, ResType, short>, Handle> byKey;
-};
-
-State& state()
+State& resourceState()
 {
     static auto* s = new State;
     return *s;
 }
 
-int indexOf(short refNum)
+int resourceFileIndex(short refNum)
 {
-    const auto& files = state().files;
+    const auto& files = resourceState().files;
     for (size_t i = 0; i < files.size(); ++i)
         if (files[i].refNum == refNum)
             return int(i);
     return -1;
+}
+
+namespace {
+
+State& state()
+{
+    return resourceState();
+}
+
+int indexOf(short refNum)
+{
+    return resourceFileIndex(refNum);
 }
 
 // The files a search sees: the current one and those opened before it, newest first.
@@ -80,7 +67,8 @@ Handle handleFor(OpenFile& file, const ResourceEntry& entry)
     const auto it = s.byKey.find(key);
     if (it != s.byKey.end())
         return it->second;
-    const Handle h = newHandleFrom(entry.data);
+    // With SetResLoad(false) the handle is made empty: LoadResource reads it.
+    const Handle h = s.load ? newHandleFrom(entry.data) : NewEmptyHandle();
     if (!h)
         return nullptr;
     markResourceHandle(h, true);
@@ -117,7 +105,9 @@ const ResourceEntry* entryOf(Handle h, Loaded* where = nullptr)
     return state().files[size_t(i)].fork.find(UInt32(it->second.type), it->second.id);
 }
 
-short openFile(const QString& path)
+} // namespace
+
+short openResourceFile(const QString& path, bool write)
 {
     State& s = state();
     const QString absolute = QFileInfo(path).absoluteFilePath();
@@ -127,22 +117,26 @@ short openFile(const QString& path)
             s.error = noErr;
             return f.refNum;
         }
-    std::optional<ResourceFork> fork = ResourceFork::load(path);
+    Velmar::Classic::ForkOrigin origin;
+    std::optional<ResourceFork> fork = ResourceFork::load(path, nullptr, &origin);
     if (!fork) {
-        s.error = fnfErr;
+        // A file that is there but holds no fork is one the Resource Manager cannot read.
+        s.error = QFileInfo::exists(path) ? mapReadErr : fnfErr;
         return -1;
     }
     OpenFile file;
     file.refNum = s.nextRef++;
     file.fork = std::move(*fork);
     file.path = absolute;
+    file.forkPath = QFileInfo(origin.path).absoluteFilePath();
+    // Only a file that is the raw fork itself is written back: a container's other data (and
+    // a companion file's) would be lost.
+    file.writable = write && origin.raw && QFileInfo(file.forkPath).isWritable();
     s.files.push_back(std::move(file));
     s.current = s.files.back().refNum;
     s.error = noErr;
     return s.current;
 }
-
-} // namespace
 
 void openProgramResources()
 {
@@ -153,7 +147,7 @@ void openProgramResources()
     if (path.isEmpty())
         path = QCoreApplication::applicationFilePath(); // load() tries "x.rsrc" and "._x" too
     if (!path.isEmpty())
-        openFile(path);
+        openResourceFile(path, true);
     s.error = noErr;
 }
 
@@ -175,6 +169,13 @@ void forgetResourceHandle(Handle h)
     const auto it = s.loaded.find(h);
     if (it == s.loaded.end())
         return;
+    // A changed resource keeps the handle's bytes for the next write: releasing, detaching or
+    // disposing of its handle first loses nothing.
+    const int i = indexOf(it->second.file);
+    ResourceEntry* entry =
+        i < 0 ? nullptr : s.files[size_t(i)].fork.find(UInt32(it->second.type), it->second.id);
+    if (entry && (entry->attributes & Velmar::Classic::kResChanged) && *h)
+        entry->data = handleBytes(h);
     s.byKey.erase(std::make_tuple(it->second.file, it->second.type, it->second.id));
     s.loaded.erase(it);
     markResourceHandle(h, false);
@@ -201,20 +202,39 @@ void VelmarClassicSetResourceFile(const char* path)
     state().programFile = path ? QString::fromLocal8Bit(path) : QString();
 }
 
-short OpenResFile(ConstStr255Param fileName)
+QString VelmarClassic::resourceFilePath(ConstStr255Param fileName)
 {
-    ensureStarted();
-    if (!VELMAR_ASSERT(fileName, "fileName != NULL"))
-        return -1;
     const QString name =
         QString::fromLatin1(toQByteArray(fileName)).replace(QLatin1Char(':'), QLatin1Char('/'));
     // A name without a folder is looked for where the program is run, then beside the program.
     if (!QFileInfo::exists(name) && QFileInfo(name).isRelative()) {
         const QString beside = QDir(QCoreApplication::applicationDirPath()).filePath(name);
         if (QFileInfo::exists(beside) || QFileInfo::exists(beside + QStringLiteral(".rsrc")))
-            return openFile(beside);
+            return beside;
     }
-    return openFile(name);
+    return name;
+}
+
+short OpenRFPerm(ConstStr255Param fileName, short, SignedByte permission)
+{
+    ensureStarted();
+    if (!VELMAR_ASSERT(fileName, "fileName != NULL"))
+        return -1;
+    if (fileName[0] == 0) {
+        state().error = fnfErr;
+        return -1;
+    }
+    return openResourceFile(resourceFilePath(fileName), permission != fsRdPerm);
+}
+
+short OpenResFile(ConstStr255Param fileName)
+{
+    return OpenRFPerm(fileName, 0, fsCurPerm);
+}
+
+short HOpenResFile(short vRefNum, long, ConstStr255Param fileName, SignedByte permission)
+{
+    return OpenRFPerm(fileName, vRefNum, permission);
 }
 
 void CloseResFile(short refNum)
@@ -225,18 +245,28 @@ void CloseResFile(short refNum)
         s.error = resFNotFound;
         return;
     }
-    // Its resources go with it.
+    // Changes are written first; a file that cannot be written is closed all the same (the
+    // program was told by ResError), as the classic Resource Manager did.
+    OSErr written = noErr;
+    if (s.files[size_t(i)].mapChanged)
+        written = writeResourceFile(s.files[size_t(i)]);
+    // Its resources go with it; if their changes could not be written, the program keeps
+    // them as plain handles rather than losing them.
     std::vector<Handle> gone;
     for (const auto& [h, where] : s.loaded)
         if (where.file == refNum)
             gone.push_back(h);
-    for (Handle h : gone)
-        DisposeHandle(h);
+    for (Handle h : gone) {
+        if (written == noErr)
+            DisposeHandle(h);
+        else
+            forgetResourceHandle(h);
+    }
     s.files.erase(s.files.begin() + i);
     if (s.current == refNum)
         s.current =
             i > 0 ? s.files[size_t(i - 1)].refNum : (s.files.empty() ? 0 : s.files.back().refNum);
-    s.error = noErr;
+    s.error = written;
 }
 
 void UseResFile(short refNum)
@@ -394,8 +424,13 @@ long GetMaxResourceSize(Handle theResource)
 
 void LoadResource(Handle theResource)
 {
-    // Resources are read when their handle is made.
-    entryOf(theResource);
+    // Resources are read when their handle is made, unless SetResLoad(false) said not to.
+    const ResourceEntry* entry = entryOf(theResource);
+    if (!entry || *theResource)
+        return;
+    ReallocateHandle(theResource, Size(entry->data.size()));
+    if (*theResource && !entry->data.isEmpty())
+        std::memcpy(*theResource, entry->data.constData(), size_t(entry->data.size()));
 }
 
 void ReleaseResource(Handle theResource)

@@ -1,23 +1,15 @@
 // Classic TextEdit: a TERec handle per library record, its fields written back after every
 // call and the ones programs set directly (rectangles, alignment, text style) handed over
 // before the next.
-#include "classic/ClassicPrivate.h"
+#include "classic/TextEditPrivate.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <cstring>
 
+namespace VelmarClassic {
+
 namespace {
-
-using namespace VelmarClassic;
-
-struct TEBlock {
-    TERec* master = nullptr; // grows with the line starts
-    Velmar::TEPtr* te = nullptr;
-    Handle text = nullptr;
-    GrafPtr port = nullptr;
-    int lineRoom = 0;
-    TERec shadow{};
-};
 
 std::unordered_map<TEHandle, TEBlock*>& records()
 {
@@ -30,7 +22,37 @@ bool sameRect(const Rect& a, const Rect& b)
     return a.top == b.top && a.left == b.left && a.bottom == b.bottom && a.right == b.right;
 }
 
-TEBlock* blockOf(TEHandle h)
+TEHandle make(const Rect* destRect, const Rect* viewRect, bool styled)
+{
+    if (!VELMAR_ASSERT(destRect && viewRect, "destRect && viewRect"))
+        return nullptr;
+    PortLink* link = currentLink();
+    if (!link)
+        return nullptr;
+    // The record takes the port's text font and size, including those the program wrote
+    // into the port record itself.
+    pullPort(*link);
+    Velmar::TEPtr* te =
+        styled ? Velmar::TEStyleNew(destRect, viewRect) : Velmar::TENew(destRect, viewRect);
+    if (!te)
+        return nullptr;
+    static unsigned serials = 0;
+    auto* b = new TEBlock;
+    b->te = te;
+    b->port = link->record;
+    b->serial = ++serials;
+    b->text = NewHandle(0);
+    b->master = static_cast<TERec*>(std::calloc(1, sizeof(TERec) + sizeof(short) * 16));
+    b->lineRoom = 17;
+    const TEHandle h = &b->master;
+    records()[h] = b;
+    tePush(b);
+    return h;
+}
+
+} // namespace
+
+TEBlock* teBlock(TEHandle h)
 {
     if (!VELMAR_ASSERT(h, "hTE != NULL"))
         return nullptr;
@@ -38,7 +60,21 @@ TEBlock* blockOf(TEHandle h)
     return VELMAR_ASSERT(it != records().end(), "IsValidTEHandle(hTE)") ? it->second : nullptr;
 }
 
-void pull(TEBlock* b)
+TEHandle teHandleOf(Velmar::TEPtr* te)
+{
+    for (const auto& [h, b] : records())
+        if (b->te == te)
+            return h;
+    return nullptr;
+}
+
+bool teStillThere(TEHandle h, unsigned serial)
+{
+    const auto it = records().find(h);
+    return it != records().end() && it->second->serial == serial;
+}
+
+void tePull(TEBlock* b)
 {
     TERec* r = b->master;
     TERec& s = b->shadow;
@@ -56,9 +92,11 @@ void pull(TEBlock* b)
         b->te->setTxSize(r->txSize);
     if (r->txFace != s.txFace)
         b->te->setTxFace(r->txFace);
+    if (r->clikLoop != s.clikLoop || r->wordBreak != s.wordBreak)
+        teSyncHooks(b);
 }
 
-void push(TEBlock* b)
+void tePush(TEBlock* b)
 {
     Velmar::TEPtr* te = b->te;
     const int lines = std::max<int>(0, te->nLines());
@@ -99,42 +137,9 @@ void push(TEBlock* b)
     b->shadow = *r;
 }
 
-// The library call between handing the record's fields over and writing them back.
-template <typename Call> void edit(TEHandle h, Call&& call)
-{
-    TEBlock* b = blockOf(h);
-    if (!b)
-        return;
-    pull(b);
-    call(b->te);
-    if (records().count(h))
-        push(b);
-}
+} // namespace VelmarClassic
 
-TEHandle make(const Rect* destRect, const Rect* viewRect, bool styled)
-{
-    if (!VELMAR_ASSERT(destRect && viewRect, "destRect && viewRect"))
-        return nullptr;
-    PortLink* link = currentLink();
-    if (!link)
-        return nullptr;
-    Velmar::TEPtr* te =
-        styled ? Velmar::TEStyleNew(destRect, viewRect) : Velmar::TENew(destRect, viewRect);
-    if (!te)
-        return nullptr;
-    auto* b = new TEBlock;
-    b->te = te;
-    b->port = link->record;
-    b->text = NewHandle(0);
-    b->master = static_cast<TERec*>(std::calloc(1, sizeof(TERec) + sizeof(short) * 16));
-    b->lineRoom = 17;
-    const TEHandle h = &b->master;
-    records()[h] = b;
-    push(b);
-    return h;
-}
-
-} // namespace
+using namespace VelmarClassic;
 
 TEHandle TENew(const Rect* destRect, const Rect* viewRect)
 {
@@ -147,7 +152,7 @@ TEHandle TEStyleNew(const Rect* destRect, const Rect* viewRect)
 
 void TEDispose(TEHandle hTE)
 {
-    TEBlock* b = blockOf(hTE);
+    TEBlock* b = teBlock(hTE);
     if (!b)
         return;
     records().erase(hTE);
@@ -161,83 +166,77 @@ void TESetText(const void* text, long length, TEHandle hTE)
 {
     if (length > 0 && !VELMAR_ASSERT(text, "text != NULL"))
         return;
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TESetText(text, Velmar::SInt32(length), te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TESetText(text, Velmar::SInt32(length), te); });
 }
 
 Handle TEGetText(TEHandle hTE)
 {
-    TEBlock* b = blockOf(hTE);
+    TEBlock* b = teBlock(hTE);
     if (!b)
         return nullptr;
-    push(b);
+    tePush(b);
     return b->text;
 }
 
 void TEIdle(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEIdle(te); });
-}
-
-void TEClick(Point pt, Boolean fExtend, TEHandle h)
-{
-    flushAllPorts();
-    edit(h, [&](Velmar::TEPtr* te) { Velmar::TEClick(pt, fExtend, te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TEIdle(te); });
 }
 
 void TESetSelect(long selStart, long selEnd, TEHandle hTE)
 {
-    edit(hTE, [&](Velmar::TEPtr* te) {
+    teEdit(hTE, [&](Velmar::TEPtr* te) {
         Velmar::TESetSelect(Velmar::SInt32(selStart), Velmar::SInt32(selEnd), te);
     });
 }
 
 void TEActivate(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEActivate(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TEActivate(te); });
 }
 void TEDeactivate(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDeactivate(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDeactivate(te); });
 }
 
 void TEKey(CharParameter key, TEHandle hTE)
 {
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEKey(char(key), te, lastLibraryEvent()); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEKey(char(key), te, lastLibraryEvent()); });
 }
 
 void TECut(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECut(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TECut(te); });
 }
 void TECopy(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECopy(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TECopy(te); });
 }
 void TEPaste(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEPaste(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TEPaste(te); });
 }
 void TEDelete(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDelete(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TEDelete(te); });
 }
 
 void TEInsert(const void* text, long length, TEHandle hTE)
 {
     if (length > 0 && !VELMAR_ASSERT(text, "text != NULL"))
         return;
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEInsert(text, Velmar::SInt32(length), te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEInsert(text, Velmar::SInt32(length), te); });
 }
 
 void TESetAlignment(short just, TEHandle hTE)
 {
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TESetAlignment(just, te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TESetAlignment(just, te); });
 }
 
 void TEUpdate(const Rect* rUpdate, TEHandle hTE)
 {
     if (VELMAR_ASSERT(rUpdate, "rUpdate != NULL"))
-        edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEUpdate(rUpdate, te); });
+        teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEUpdate(rUpdate, te); });
 }
 
 void TETextBox(const void* text, long length, const Rect* box, short just)
@@ -249,27 +248,49 @@ void TETextBox(const void* text, long length, const Rect* box, short just)
 
 void TEScroll(short dh, short dv, TEHandle hTE)
 {
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEScroll(dh, dv, te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEScroll(dh, dv, te); });
 }
 
 void TESelView(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TESelView(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TESelView(te); });
 }
 
 void TEAutoView(Boolean fAuto, TEHandle hTE)
 {
-    edit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEAutoView(fAuto, te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEAutoView(fAuto, te); });
 }
 
 void TECalText(TEHandle hTE)
 {
-    edit(hTE, [](Velmar::TEPtr* te) { Velmar::TECalText(te); });
+    teEdit(hTE, [](Velmar::TEPtr* te) { Velmar::TECalText(te); });
 }
 
 short TEGetOffset(Point pt, TEHandle hTE)
 {
     short offset = 0;
-    edit(hTE, [&](Velmar::TEPtr* te) { offset = Velmar::TEGetOffset(pt, te); });
+    teEdit(hTE, [&](Velmar::TEPtr* te) { offset = Velmar::TEGetOffset(pt, te); });
     return offset;
+}
+
+Point TEGetPoint(short offset, TEHandle hTE)
+{
+    Point pt{};
+    teEdit(hTE, [&](Velmar::TEPtr* te) { pt = Velmar::TEGetPoint(offset, te); });
+    return pt;
+}
+
+long TEGetHeight(long endLine, long startLine, TEHandle hTE)
+{
+    long height = 0;
+    const auto line = [](long n) { return Velmar::SInt32(std::clamp<long>(n, -32768, 32767)); };
+    teEdit(hTE, [&](Velmar::TEPtr* te) {
+        height = Velmar::TEGetHeight(line(endLine), line(startLine), te);
+    });
+    return height;
+}
+
+void TEPinScroll(short dh, short dv, TEHandle hTE)
+{
+    teEdit(hTE, [&](Velmar::TEPtr* te) { Velmar::TEPinScroll(dh, dv, te); });
 }

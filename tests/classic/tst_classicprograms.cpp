@@ -9,6 +9,7 @@
 #include <QImage>
 #include <QProcess>
 #include <QScreen>
+#include <QTemporaryDir>
 #include <QTest>
 
 #include <memory>
@@ -20,9 +21,10 @@ constexpr unsigned long kKeyQ = 0x71, kKeyN = 0x6e, kControl = 0xffe3;
 
 class Program {
 public:
-    explicit Program(const QString& name)
+    explicit Program(const QString& name, const QString& folder = QString())
     {
         m_process.setProgram(QStringLiteral(CLASSIC_PROGRAM_DIR "/classic_") + name);
+        m_process.setWorkingDirectory(folder);
         m_process.setProcessChannelMode(QProcess::ForwardedErrorChannel);
         m_process.start();
     }
@@ -60,7 +62,8 @@ public:
     }
     bool finished(int* code)
     {
-        if (!m_process.waitForFinished(10000))
+        // waitForFinished answers false for a process that has already ended.
+        if (m_process.state() != QProcess::NotRunning && !m_process.waitForFinished(10000))
             return false;
         *code = m_process.exitCode();
         return m_process.exitStatus() == QProcess::NormalExit;
@@ -125,19 +128,72 @@ private Q_SLOTS:
             "storageUsed=1", "thePort=1", "portRect=300200", "portBitsOrigin=1", "windowKind=8",
             "visible=1", "goAwayFlag=1", "refCon=42", "titleLength=7", "secondBehindFirst=1",
             "contRgnWidth=300", "GetWRefCon=99", "pnLocAfterMove=35045", "txSize=18",
-            "rgnRect=1011070", "rgnOvalComplex=1", "random1=16807", "seedAfter=16807",
-            "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101", "shortDateLength=6",
-            "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1", "locked=1",
-            "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
+            "rgnRect=1011070", "rgnOvalComplex=1", "rgnScanLines=1", "random1=16807",
+            "seedAfter=16807", "randomPlainGlobal=1", "dateRoundTrip=1", "epoch=19040101",
+            "shortDateLength=6", "stringToNum=-1234567", "hiword=4660", "bitTst=10", "bitShift=1",
+            "locked=1", "grown=1000000", "oneHandlePerResource=1", "strLength=5", "resInfo=1281",
             "countMenus=3", "indString2=5", "missing=1", "homeFile=1", "teLength=13", "teLines=3",
             "teTextSize=13", "teSel=407", "updateEvent=1", "trapAvailable=1", "gestalt=1",
-            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35", "polyPoint2=3040", "done=1"};
+            "polygon=265141", "pictFrame=3232", "pictDrawn=10", "cursorHotSpot=35",
+            "polyPoint2=3040", "done=1"};
         QStringList missing;
         for (const QString& line : expected)
             if (!p.seen().contains(line))
                 missing << line;
         QVERIFY2(missing.isEmpty(),
             qPrintable("missing: " + missing.join(' ') + "\nseen: " + p.seen().join(' ')));
+        int code = -1;
+        QVERIFY(p.finished(&code));
+        QCOMPARE(code, 0);
+    }
+
+    void styledTextResourceFilesAndHooks()
+    {
+        QTemporaryDir folder; // where the program writes its resource file
+        Program p(QStringLiteral("textres"), folder.path());
+        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
+        QCOMPARE(o.size(), 2);
+        const QPoint origin(o[0], o[1]);
+        // Runs from 'styl' (bold, then red from offset 8), a scrap of two 20-byte runs, and a
+        // file written, closed, reopened read-only and read back.
+        const QStringList expected = {"teLength=16", "face0=1", "red0=0", "face9=0", "red9=65535",
+            "scrapRuns=1", "created=0", "createdAgain=-48", "opened=1", "added=0",
+            "addedTwice=-194", "updated=0", "closed=0", "readBack=1", "readBackInfo=1",
+            "oldIdGone=1", "readOnlyChange=-61", "readOnlyAdd=-194", "readOnlyRemove=-196",
+            "roundTripFace=1"};
+        QStringList missing;
+        for (const QString& line : expected)
+            if (!p.seen().contains(line))
+                missing << line;
+        QVERIFY2(missing.isEmpty(),
+            qPrintable("missing: " + missing.join(' ') + "\nseen: " + p.seen().join(' ')));
+
+        // The red run is drawn red, the bold one is not.
+        m_x.moveTo(origin + QPoint(300, 170));
+        const QImage shot = screen();
+        const auto reds = [&](const QRect& local) {
+            int n = 0;
+            const QRect area = local.translated(origin);
+            for (int y = area.top(); y <= area.bottom(); ++y)
+                for (int x = area.left(); x <= area.right(); ++x) {
+                    const QColor c = shot.pixelColor(x, y);
+                    n += c.red() > 160 && c.green() < 100 && c.blue() < 100;
+                }
+            return n;
+        };
+        QVERIFY2(reds(QRect(10, 10, 290, 30)) > 10, qPrintable(p.seen().join(' ')));
+        QCOMPARE(reds(QRect(10, 10, 30, 30)), 0);
+
+        // A double click selects by the program's word breaks: "foo-bar" whole.
+        click(origin + QPoint(14, 18));
+        click(origin + QPoint(14, 18));
+        QCOMPARE(p.waitFor(QStringLiteral("selected")), QStringLiteral("selected 0 7"));
+        // The click loop runs while the button is held and may dispose of its own record.
+        m_x.moveTo(origin + QPoint(40, 80));
+        m_x.button(1, true);
+        QTest::qWait(400);
+        m_x.button(1, false);
+        QCOMPARE(p.waitFor(QStringLiteral("loop")), QStringLiteral("loop 3 1"));
         int code = -1;
         QVERIFY(p.finished(&code));
         QCOMPARE(code, 0);

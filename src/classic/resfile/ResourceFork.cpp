@@ -204,14 +204,20 @@ std::optional<ResourceFork> ResourceFork::parse(const QByteArray& fork, QString*
     return result;
 }
 
-std::optional<ResourceFork> ResourceFork::unwrap(const QByteArray& file, QString* error)
+std::optional<ResourceFork> ResourceFork::unwrap(
+    const QByteArray& file, QString* error, bool* isWrapped)
 {
     QString why;
+    if (isWrapped)
+        *isWrapped = false;
     const auto wrapped = Wrappers::unwrap(file, &why);
     if (wrapped && wrapped->kind != Wrappers::Kind::None) {
         if (!wrapped->resourceFork.isEmpty()) {
-            if (auto fork = parse(wrapped->resourceFork, &why))
+            if (auto fork = parse(wrapped->resourceFork, &why)) {
+                if (isWrapped)
+                    *isWrapped = true;
                 return fork;
+            }
         } else if (why.isEmpty()) {
             why = QStringLiteral("the resource fork is empty");
         }
@@ -225,7 +231,8 @@ std::optional<ResourceFork> ResourceFork::unwrap(const QByteArray& file, QString
     return parse(file, error);
 }
 
-std::optional<ResourceFork> ResourceFork::load(const QString& path, QString* error)
+std::optional<ResourceFork> ResourceFork::load(
+    const QString& path, QString* error, ForkOrigin* origin)
 {
     QStringList reasons;
     const QFileInfo info(path);
@@ -244,8 +251,12 @@ std::optional<ResourceFork> ResourceFork::load(const QString& path, QString* err
             reasons.append(QStringLiteral("%1: %2").arg(candidate, why));
             continue;
         }
-        if (auto fork = unwrap(*bytes, &why))
+        bool wrapped = false;
+        if (auto fork = unwrap(*bytes, &why, &wrapped)) {
+            if (origin)
+                *origin = {candidate, !wrapped && !candidate.endsWith(QStringLiteral("/rsrc"))};
             return fork;
+        }
         reasons.append(QStringLiteral("%1: %2").arg(candidate, why));
     }
     if (reasons.isEmpty())
@@ -277,6 +288,22 @@ const ResourceEntry* ResourceFork::find(UInt32 type, SInt16 id) const
             return &e;
     }
     return nullptr;
+}
+
+ResourceEntry* ResourceFork::find(UInt32 type, SInt16 id)
+{
+    return const_cast<ResourceEntry*>(std::as_const(*this).find(type, id));
+}
+
+bool ResourceFork::remove(UInt32 type, SInt16 id)
+{
+    for (qsizetype i = 0; i < m_entries.size(); ++i) {
+        if (m_entries[i].type == type && m_entries[i].id == id) {
+            m_entries.removeAt(i);
+            return true;
+        }
+    }
+    return false;
 }
 
 const ResourceEntry* ResourceFork::findNamed(UInt32 type, const QByteArray& name) const

@@ -31,6 +31,13 @@ struct ResourceEntry {
     QByteArray data;
 };
 
+// Where load() found a fork: the file, and whether that file is the raw fork itself (which can
+// be written back in place) or a container or companion holding other data too.
+struct ForkOrigin {
+    QString path;
+    bool raw = false;
+};
+
 class ResourceFork {
 public:
     // Raw resource fork bytes. Refuses anything inconsistent (offsets past the end, overlapping
@@ -39,9 +46,12 @@ public:
     // A file holding a raw fork, a MacBinary I/II/III file, an AppleSingle or AppleDouble file.
     // For a path "x" that is none of these (or absent) also tries "x.rsrc", "._x" and
     // "x/..namedfork/rsrc", in that order.
-    static std::optional<ResourceFork> load(const QString& path, QString* error = nullptr);
+    static std::optional<ResourceFork> load(
+        const QString& path, QString* error = nullptr, ForkOrigin* origin = nullptr);
     // The fork inside one file's bytes, unwrapped as load() does (no companion files).
-    static std::optional<ResourceFork> unwrap(const QByteArray& file, QString* error = nullptr);
+    // *wrapped says whether it came out of a container.
+    static std::optional<ResourceFork> unwrap(
+        const QByteArray& file, QString* error = nullptr, bool* wrapped = nullptr);
 
     QList<UInt32> types() const; // in file order
     int count(UInt32 type) const;
@@ -52,6 +62,8 @@ public:
 
     QByteArray serialize() const; // a valid raw fork
     void add(ResourceEntry e);    // replaces the entry with the same type and ID
+    ResourceEntry* find(UInt32 type, SInt16 id);
+    bool remove(UInt32 type, SInt16 id);
 
 private:
     QList<ResourceEntry> m_entries; // grouped by type, types in file order

@@ -6,6 +6,8 @@
 #define VELMAR_CLASSIC_SHARES_RECT 1
 #include <ClassicToolbox.h>
 
+#include <QFile>
+#include <QTemporaryDir>
 #include <QTest>
 
 #include <climits>
@@ -55,6 +57,47 @@ private Q_SLOTS:
         WindowPtr goneWindow = NewWindow(
             nullptr, &bounds, (const unsigned char*)"\1w", false, 0, (WindowPtr)-1L, true, 0);
         DisposeWindow(goneWindow);
+        WindowPtr textWindow = NewWindow(
+            nullptr, &bounds, (const unsigned char*)"\1t", false, 0, (WindowPtr)-1L, false, 0);
+        SetPort(textWindow);
+        TEHandle styled = TEStyleNew(&bounds, &bounds);
+        TEHandle goneTE = TENew(&bounds, &bounds);
+        TEDispose(goneTE);
+        // A 'styl' scrap claiming more runs than it holds, and one with a negative count.
+        const auto scrap = [](std::initializer_list<unsigned char> bytes) {
+            Handle h = NewHandle(Size(bytes.size()));
+            std::copy(bytes.begin(), bytes.end(), reinterpret_cast<unsigned char*>(*h));
+            return reinterpret_cast<StScrpHandle>(h);
+        };
+        StScrpHandle truncated = scrap(
+            {0, 9, 0, 0, 0, 0, 0, 16, 0, 12, 0, 0, 1, 0, 0, 12, 0, 0, 0, 0, 0, 0, 0, 0, 0, 3});
+        StScrpHandle negative = scrap({0x80, 0});
+        QTemporaryDir folder;
+        const QByteArray dataFile = folder.filePath(QStringLiteral("data")).toLocal8Bit();
+        QFile data(QString::fromLocal8Bit(dataFile));
+        data.open(QIODevice::WriteOnly);
+        data.write("the program's own data");
+        data.close();
+        const auto pstr = [](const QByteArray& text) {
+            static unsigned char s[256];
+            s[0] = (unsigned char)std::min<qsizetype>(text.size(), 255);
+            std::memcpy(s + 1, text.constData(), s[0]);
+            return s;
+        };
+        Handle plainHandle = NewHandle(1);
+        // Rows that answer ResError, or the text record's length, after the call.
+        const auto resError = [](std::function<void()> call) {
+            return [call] {
+                call();
+                return long(ResError());
+            };
+        };
+        const auto teLength = [&](std::function<void()> call) {
+            return [call, styled] {
+                call();
+                return long((**styled).teLength);
+            };
+        };
         const Case cases[] = {
             {"DisposeRgn made-up",
                 [&] {
@@ -207,6 +250,61 @@ private Q_SLOTS:
                 0, "bm != NULL"},
             {"PlotIconHandle made-up", [&] { return long(PlotIconHandle(&bounds, 0, 0, madeUp)); },
                 paramErr, "IsValidHandle(theIcon)"},
+            {"TEStyleInsert truncated styl",
+                teLength([&] { TEStyleInsert("abcdef", 6, truncated, styled); }), 6, ""},
+            {"TEStyleInsert negative count",
+                teLength([&] { TEStyleInsert("gh", 2, negative, styled); }), 8, ""},
+            {"TEStyleInsert made-up scrap", teLength([&] {
+                 TEStyleInsert("x", 1, reinterpret_cast<StScrpHandle>(junk), styled);
+             }),
+                8, "IsValidHandle(hST)"},
+            {"TEGetStyle disposed record",
+                [&] {
+                    TextStyle style{};
+                    TEGetStyle(0, &style, nullptr, nullptr, goneTE);
+                    return long(style.tsSize);
+                },
+                0, "IsValidTEHandle(hTE)"},
+            {"TESetStyle null style", teLength([&] { TESetStyle(doFace, nullptr, true, styled); }),
+                8, "newStyle != NULL"},
+            {"AddResource made-up handle",
+                resError([&] { AddResource(madeUp, 'TEXT', 128, nullptr); }), addResFailed, ""},
+            {"RemoveResource plain handle", resError([&] { RemoveResource(plainHandle); }),
+                rmvResFailed, ""},
+            {"ChangedResource disposed", resError([&] { ChangedResource(goneHandle); }),
+                resNotFound, ""},
+            {"UpdateResFile unknown", resError([] { UpdateResFile(999); }), resFNotFound, ""},
+            {"CreateResFile empty name", resError([] { CreateResFile((const unsigned char*)""); }),
+                paramErr, ""},
+            {"CreateResFile in no folder",
+                resError([&] { CreateResFile(pstr("/nonexistent/folder/x")); }), dirNFErr, ""},
+            {"CreateResFile over a data file keeps the data",
+                [&] {
+                    CreateResFile(pstr(dataFile));
+                    QFile back(QString::fromLocal8Bit(dataFile));
+                    back.open(QIODevice::ReadOnly);
+                    return long(ResError()) * 10 + (back.readAll() == "the program's own data")
+                        + 2 * QFile::exists(QString::fromLocal8Bit(dataFile + ".rsrc"));
+                },
+                3, ""},
+            {"SetResLoad false gives an empty handle",
+                [&] {
+                    const short ref = OpenResFile(pstr(dataFile));
+                    UseResFile(ref);
+                    Handle h = NewHandle(3);
+                    AddResource(h, 'DATA', 5, nullptr);
+                    UpdateResFile(ref);
+                    ReleaseResource(h);
+                    SetResLoad(false);
+                    h = Get1Resource('DATA', 5);
+                    SetResLoad(true);
+                    const long empty = h && *h == nullptr;
+                    LoadResource(h);
+                    const long loaded = h && *h && GetHandleSize(h) == 3;
+                    CloseResFile(ref);
+                    return empty * 10 + loaded;
+                },
+                11, ""},
             {"DrawString without port",
                 [] {
                     DrawString((const unsigned char*)"\1x");

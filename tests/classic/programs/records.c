@@ -67,6 +67,21 @@ int main(void)
     FrameOval(&w->portRect);
     CloseRgn(rgn);
     Show("rgnOvalComplex", (**rgn).rgnSize > 10);
+    {
+        /* An L: the scan lines after the record, as classic code walks them. */
+        static const short expected[] = {
+            0, 0, 20, 0x7fff, 10, 10, 20, 0x7fff, 20, 0, 10, 0x7fff, 0x7fff};
+        RgnHandle foot = NewRgn();
+        const short* lines;
+        SetRectRgn(rgn, 0, 0, 20, 10);
+        SetRectRgn(foot, 0, 10, 10, 20);
+        UnionRgn(rgn, foot, rgn);
+        lines = (const short*)((const char*)*rgn + 10);
+        Show("rgnScanLines",
+            (**rgn).rgnSize == 10 + sizeof expected
+                && memcmp(lines, expected, sizeof expected) == 0);
+        DisposeRgn(foot);
+    }
     DisposeRgn(rgn);
     {
         PolyHandle poly = OpenPoly();
