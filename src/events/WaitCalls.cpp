@@ -57,9 +57,10 @@ Boolean WaitNextEvent(EventMask eventMask, EventRecord* theEvent, UInt32 sleep, 
         return true;
     }
     if (result == eventLoopTimedOutErr) {
-        EventQueueItemSmartPtr null = EventQueueItemSmartPtr::Create();
-        FillNullEvent(null.get());
-        *theEvent = null->toEventRecord();
+        // One item serves every null event: it is filled and read here, never handed out.
+        static const EventQueueItemSmartPtr sNull = EventQueueItemSmartPtr::Create();
+        FillNullEvent(sNull.get());
+        *theEvent = sNull->toEventRecord();
         return false;
     }
     *theEvent = EventRecord{};
