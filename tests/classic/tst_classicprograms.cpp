@@ -99,6 +99,23 @@ double darkShare(const QImage& image, const QRect& area)
     return all ? double(dark) / all : 0;
 }
 
+// An area of a program's window (in its local coordinates) and the share of dark pixels
+// it must show.
+struct DarkCase {
+    const char* what;
+    QRect local;
+    double minDark, maxDark;
+};
+
+void checkDarkness(const QImage& shot, const QPoint& origin, std::initializer_list<DarkCase> cases)
+{
+    for (const DarkCase& c : cases) {
+        const double share = darkShare(shot, c.local.translated(origin));
+        QVERIFY2(share >= c.minDark && share <= c.maxDark,
+            qPrintable(QStringLiteral("%1: %2").arg(QLatin1String(c.what)).arg(share)));
+    }
+}
+
 bool windowManagerRuns()
 {
     QProcess xprop;
@@ -257,25 +274,15 @@ private Q_SLOTS:
         QCOMPARE(o.size(), 2);
         const QPoint origin(o[0], o[1]);
         m_x.moveTo(origin + QPoint(300, 250)); // out of the way
-        const QImage before = screen();
-        struct Case {
-            const char* what;
-            QRect local;
-            double minDark, maxDark;
-        };
         // Patterns paint set bits in ink; srcBic text clears its pixels; patXor inverts.
-        const Case cases[] = {
-            {"ltGray is light", QRect(12, 12, 96, 46), 0.15, 0.35},
-            {"dkGray is dark", QRect(122, 12, 96, 46), 0.65, 0.85},
-            {"srcBic text clears", QRect(12, 72, 96, 46), 0.4, 0.95},
-            {"patXor inverts black", QRect(122, 72, 46, 46), 0.0, 0.05},
-            {"black beside it", QRect(172, 72, 46, 46), 0.95, 1.0},
-        };
-        for (const Case& c : cases) {
-            const double share = darkShare(before, c.local.translated(origin));
-            QVERIFY2(share >= c.minDark && share <= c.maxDark,
-                qPrintable(QStringLiteral("%1: %2").arg(QLatin1String(c.what)).arg(share)));
-        }
+        checkDarkness(screen(), origin,
+            {
+                {"ltGray is light", QRect(12, 12, 96, 46), 0.15, 0.35},
+                {"dkGray is dark", QRect(122, 12, 96, 46), 0.65, 0.85},
+                {"srcBic text clears", QRect(12, 72, 96, 46), 0.4, 0.95},
+                {"patXor inverts black", QRect(122, 72, 46, 46), 0.0, 0.05},
+                {"black beside it", QRect(172, 72, 46, 46), 0.95, 1.0},
+            });
 
         // While the button is held, the loop's lines reach the screen.
         m_x.moveTo(origin + QPoint(40, 200));
@@ -304,35 +311,25 @@ private Q_SLOTS:
         QCOMPARE(o.size(), 2);
         const QPoint origin(o[0], o[1]);
         m_x.moveTo(origin + QPoint(390, 290));
-        const QImage shot = screen();
-        struct Case {
-            const char* what;
-            QRect local;
-            double minDark, maxDark;
-        };
         // The bitmap is black on its left half; each copy shows it through its mode.
-        const Case cases[] = {
-            {"srcCopy", QRect(12, 12, 28, 60), 0.99, 1.0},
-            {"srcCopy right", QRect(44, 12, 28, 60), 0.0, 0.01},
-            {"scaled", QRect(92, 12, 60, 124), 0.99, 1.0},
-            {"scaled right", QRect(156, 12, 60, 124), 0.0, 0.01},
-            {"srcXor on black", QRect(232, 12, 28, 60), 0.0, 0.01},
-            {"srcXor beside", QRect(264, 12, 28, 60), 0.99, 1.0},
-            {"srcBic", QRect(312, 12, 28, 60), 0.0, 0.01},
-            {"srcBic beside", QRect(344, 12, 28, 60), 0.99, 1.0},
-            {"notSrcCopy", QRect(12, 152, 28, 60), 0.0, 0.01},
-            {"notSrcCopy right", QRect(44, 152, 28, 60), 0.99, 1.0},
-            {"icon over mask", QRect(91, 151, 14, 14), 0.99, 1.0},
-            {"mask without icon", QRect(91, 167, 14, 14), 0.0, 0.01},
-            {"outside the mask", QRect(107, 151, 14, 30), 0.99, 1.0},
-            {"srcXor text twice", QRect(148, 215, 80, 32), 0.0, 0.0},
-            {"srcXor text once", QRect(248, 215, 80, 32), 0.05, 0.6},
-        };
-        for (const Case& c : cases) {
-            const double share = darkShare(shot, c.local.translated(origin));
-            QVERIFY2(share >= c.minDark && share <= c.maxDark,
-                qPrintable(QStringLiteral("%1: %2").arg(QLatin1String(c.what)).arg(share)));
-        }
+        checkDarkness(screen(), origin,
+            {
+                {"srcCopy", QRect(12, 12, 28, 60), 0.99, 1.0},
+                {"srcCopy right", QRect(44, 12, 28, 60), 0.0, 0.01},
+                {"scaled", QRect(92, 12, 60, 124), 0.99, 1.0},
+                {"scaled right", QRect(156, 12, 60, 124), 0.0, 0.01},
+                {"srcXor on black", QRect(232, 12, 28, 60), 0.0, 0.01},
+                {"srcXor beside", QRect(264, 12, 28, 60), 0.99, 1.0},
+                {"srcBic", QRect(312, 12, 28, 60), 0.0, 0.01},
+                {"srcBic beside", QRect(344, 12, 28, 60), 0.99, 1.0},
+                {"notSrcCopy", QRect(12, 152, 28, 60), 0.0, 0.01},
+                {"notSrcCopy right", QRect(44, 152, 28, 60), 0.99, 1.0},
+                {"icon over mask", QRect(91, 151, 14, 14), 0.99, 1.0},
+                {"mask without icon", QRect(91, 167, 14, 14), 0.0, 0.01},
+                {"outside the mask", QRect(107, 151, 14, 30), 0.99, 1.0},
+                {"srcXor text twice", QRect(148, 215, 80, 32), 0.0, 0.0},
+                {"srcXor text once", QRect(248, 215, 80, 32), 0.05, 0.6},
+            });
         m_x.tap(kKeyQ);
         int code = -1;
         QVERIFY(p.finished(&code));
