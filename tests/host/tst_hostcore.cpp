@@ -144,29 +144,6 @@ private Q_SLOTS:
         TxDisposeHandle(copy);
     }
 
-    void unusableHandlesAreRefused()
-    {
-        VelmarTest::LogCapture log;
-        TxDisposeHandle(nullptr);
-        QVERIFY(!TxCopyHand(nullptr));
-        QCOMPARE(TxGetHandleSize(nullptr), Size(-1));
-
-        Handle h = TxPtrToHand("abc", 3);
-        TxDisposeHandle(h);
-        TxDisposeHandle(h); // twice: refused, not freed again
-        QVERIFY(log.contains(QStringLiteral("TxDisposeHandle: not a live handle")));
-        QVERIFY(!TxCopyHand(h));
-
-        char block[16] = {};
-        Ptr master = block;
-        QVERIFY(!TxIsValidHandle(&master)); // a foreign master pointer is never taken for ours
-        TxDisposeHandle(&master);
-
-        QVERIFY(!TxPtrToHand("x", -1));
-        QVERIFY(!TxPtrToHand(nullptr, 0x7fffffff));
-        QVERIFY(log.contains(QStringLiteral("TxPtrToHand: refused size")));
-    }
-
     void textTable()
     {
         TextTable* table = TextTable::Get();
@@ -217,14 +194,6 @@ private Q_SLOTS:
         QVERIFY(screens->GetUsableRect(9999).isNull());
         const SInt16 menuBar = screens->GetMenuBarHeight(current);
         QVERIFY(menuBar > 0 && menuBar < 200);
-    }
-
-    void xerrorWithNulls()
-    {
-        const XError empty(nullptr, nullptr);
-        QCOMPARE(QByteArray(empty.GetErrorMessage()), QByteArray());
-        QCOMPARE(QByteArray(empty.GetFile()), QByteArray());
-        QCOMPARE(empty.GetLine(), SInt32(0));
     }
 
     void automationListener()

@@ -175,28 +175,6 @@ private Q_SLOTS:
         QCOMPARE(MakeQString("\x82", 1).size(), 1); // a lead byte cut off at the end
     }
 
-    void badArguments()
-    {
-        unsigned short units[4] = {9, 9, 9, 9};
-        QCOMPARE(CurrentMacMBCSEncodingToUTF16(nullptr, 5, units, 4), 0);
-        QCOMPARE(int(units[0]), 0);
-        QCOMPARE(CurrentMacMBCSEncodingToUTF16("abc", 0, units, 4), 0);
-        QCOMPARE(CurrentMacMBCSEncodingToUTF16("abc", 3, nullptr, 10), 3);
-        QCOMPARE(CurrentMacMBCSEncodingToUTF16("abc", 3, units, -5), 3);
-
-        char bytes[4] = {9, 9, 9, 9};
-        bool lossy = true;
-        QCOMPARE(UTF16ToCurrentMacMBCSEncoding(nullptr, 3, bytes, 4, &lossy), 0);
-        QCOMPARE(bytes[0], '\0');
-        QVERIFY(!lossy);
-        const unsigned short abc[] = {'a', 'b', 'c', 0};
-        QCOMPARE(UTF16ToCurrentMacMBCSEncoding(abc, 3, nullptr, 4, &lossy), 0);
-        QVERIFY(lossy); // nowhere to put the text
-        QCOMPARE(UTF16ToCurrentMacMBCSEncoding(abc, 3, bytes, 0, nullptr), 0);
-        QCOMPARE(UTF16ToCurrentMacMBCSEncoding(abc, -1, bytes, 4, nullptr), 3);
-        QCOMPARE(QByteArray(bytes), QByteArray("abc"));
-    }
-
     void selectsAndRefusesEncodings()
     {
         const std::tuple<const char*, int, int> usable[] = {{"x-mac-cyrillic", 0x80, 0x0410},

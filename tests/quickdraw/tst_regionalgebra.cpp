@@ -80,40 +80,6 @@ private Q_SLOTS:
         QCOMPARE(PtInRgn(P(20, 19), r.get()), 0);
     }
 
-    void nullHandlesAreSafe()
-    {
-        VelmarTest::LogCapture log;
-        Rgn a = rectRgn(0, 0, 10, 10), dst = rectRgn(50, 50, 60, 60);
-        const QRegion before = *dst;
-        UnionRgn(a.get(), nullptr, dst.get());
-        SectRgn(nullptr, a.get(), dst.get());
-        DiffRgn(a.get(), nullptr, dst.get());
-        XorRgn(nullptr, nullptr, dst.get());
-        QCOMPARE(*dst, before);
-        UnionRgn(a.get(), a.get(), nullptr);
-        DisposeRgn(nullptr);
-        CopyRgn(nullptr, dst.get());
-        CopyRgn(a.get(), nullptr);
-        SetEmptyRgn(nullptr);
-        RectRgn(nullptr, nullptr);
-        OffsetRgn(nullptr, 1, 1);
-        InsetRgn(nullptr, 1, 1);
-        MapRgn(nullptr, nullptr, nullptr);
-        QCOMPARE(PtInRgn(P(1, 1), nullptr), 0);
-        const Rect r{0, 0, 5, 5};
-        QCOMPARE(RectInRgn(&r, nullptr), 0);
-        QCOMPARE(RectInRgn(nullptr, a.get()), 0);
-        QCOMPARE(EmptyRgn(nullptr), 1);
-        QCOMPARE(EqualRgn(nullptr, nullptr), 1);
-        QCOMPARE(EqualRgn(a.get(), nullptr), 0);
-        QCOMPARE(GetRegionBounds(a.get(), nullptr), nullptr);
-        Rect b{1, 1, 1, 1};
-        QCOMPARE(GetRegionBounds(nullptr, &b), &b);
-        QVERIFY(b.top == 0 && b.left == 0 && b.bottom == 0 && b.right == 0);
-        QVERIFY(log.contains("CopyRgn"));
-        QVERIFY(log.contains("EmptyRgn"));
-    }
-
     // Explicitly on a rectangle, then against the step-by-step definition: rectangles by
     // small and absurd amounts, an L shape (its inner corner, growth far past its size, the
     // fast path) and random regions of many rectangles and far-apart pieces.
