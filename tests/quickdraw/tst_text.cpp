@@ -14,23 +14,14 @@
 
 using namespace Velmar;
 using namespace QDTest;
+using VelmarTest::P;
+using VelmarTest::pascal;
 
 namespace {
 
 Palette::PaletteManager& palette()
 {
     return *Palette::PaletteManager::Instance();
-}
-
-// A Pascal string of Latin-1 text.
-QByteArray pascal(const char* text)
-{
-    QByteArray p(1, char(std::strlen(text)));
-    return p + text;
-}
-const unsigned char* P(const QByteArray& p)
-{
-    return reinterpret_cast<const unsigned char*>(p.constData());
 }
 
 // Advance widths of Arial's glyphs in thousandths of an em (the same as Helvetica's).
@@ -152,43 +143,29 @@ private Q_SLOTS:
         QTest::addColumn<double>("points");
         QTest::addColumn<int>("gotFace"); // read back from the QFont
 
-        QTest::newRow("geneva") << 3 << 12 << 0 << false << ""
-                                << ""
-                                << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("monaco") << 4 << 10 << 0 << false << ""
-                                << ""
-                                << "Courier New" << 2 << 7.5 << 0;
-        QTest::newRow("app name wins") << 4 << 12 << 0 << true << "AppFontNameWin"
-                                       << "Arial"
-                                       << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("geneva") << 3 << 12 << 0 << false << "" << "" << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("monaco") << 4 << 10 << 0 << false << "" << "" << "Courier New" << 2 << 7.5
+            << 0;
+        QTest::newRow("app name wins") << 4 << 12 << 0 << true << "AppFontNameWin" << "Arial"
+            << "Arial" << 3 << 9.0 << 0;
         QTest::newRow("app name by toolbox name") << 22 << 12 << 0 << true << "AppFontNameWin"
-                                                  << "Times"
-                                                  << "Times New Roman" << 1 << 9.0 << 0;
-        QTest::newRow("app name unknown")
-            << 4 << 12 << 0 << true << "AppFontNameWin"
-            << "Nope" << QGuiApplication::font().family() << 3 << 9.0 << 0;
-        QTest::newRow("app size") << 3 << 12 << 0 << true << "AppFontSizeLarge"
-                                  << "14"
-                                  << "Arial" << 3 << 10.5 << 0;
-        QTest::newRow("app size not asked") << 3 << 12 << 0 << false << "AppFontSizeLarge"
-                                            << "14"
-                                            << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("humongous") << 3 << 64 << 0 << true << "AppFontSizeHumongous"
-                                   << "96"
-                                   << "Arial" << 3 << 72.0 << 0;
-        QTest::newRow("bold underline") << 3 << 12 << (bold | underline) << false << ""
-                                        << ""
-                                        << "Arial" << 3 << 9.0 << (bold | underline);
-        QTest::newRow("italic outline condense")
-            << 3 << 12 << (italic | outline | condense) << false << ""
-            << ""
-            << "Arial" << 3 << 9.0 << (italic | outline | condense);
-        QTest::newRow("shadow extend nothing") << 3 << 12 << (shadow | extend) << false << ""
-                                               << ""
-                                               << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("face is a byte") << 3 << 12 << 0x101 << false << ""
-                                        << ""
-                                        << "Arial" << 3 << 9.0 << int(bold);
+            << "Times" << "Times New Roman" << 1 << 9.0 << 0;
+        QTest::newRow("app name unknown") << 4 << 12 << 0 << true << "AppFontNameWin" << "Nope"
+            << QGuiApplication::font().family() << 3 << 9.0 << 0;
+        QTest::newRow("app size") << 3 << 12 << 0 << true << "AppFontSizeLarge" << "14" << "Arial"
+            << 3 << 10.5 << 0;
+        QTest::newRow("app size not asked") << 3 << 12 << 0 << false << "AppFontSizeLarge" << "14"
+            << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("humongous") << 3 << 64 << 0 << true << "AppFontSizeHumongous" << "96"
+            << "Arial" << 3 << 72.0 << 0;
+        QTest::newRow("bold underline") << 3 << 12 << (bold | underline) << false << "" << ""
+            << "Arial" << 3 << 9.0 << (bold | underline);
+        QTest::newRow("italic outline condense") << 3 << 12 << (italic | outline | condense)
+            << false << "" << "" << "Arial" << 3 << 9.0 << (italic | outline | condense);
+        QTest::newRow("shadow extend nothing") << 3 << 12 << (shadow | extend) << false << "" << ""
+            << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("face is a byte") << 3 << 12 << 0x101 << false << "" << "" << "Arial" << 3
+            << 9.0 << int(bold);
     }
 
     void fontRules()
