@@ -402,7 +402,6 @@ private Q_SLOTS:
         const BitMapPtr& from = GetPortBitMapForCopyBits(src);
         const std::pair<const char*, std::function<void()>> calls[] = {
             {"null source", [&] { CopyBits(nullptr, to, &eight, &eight, srcCopy, nullptr); }},
-            {"null port's map", [&] { CopyBits(GetPortBitMapForCopyBits(nullptr), to, &eight, &eight, srcCopy, nullptr); }},
             {"stale pixmap", [&] { CopyBits(stale, to, &eight, &eight, srcCopy, nullptr); }},
             {"freed pixmap", [&] { CopyBits(from, freed, &eight, &eight, srcCopy, nullptr); }},
             {"pixmap without pixels", [&] { CopyBits(empty, to, &eight, &eight, srcCopy, nullptr); }},
