@@ -77,12 +77,6 @@ QRgb expectedPixel(SInt16 mode, QRgb s, QRgb d, const Ink& ink)
     return qRgb(c[0], c[1], c[2]);
 }
 
-bool near(QRgb a, QRgb b)
-{
-    return qAlpha(a) == qAlpha(b) && std::abs(qRed(a) - qRed(b)) <= 1
-        && std::abs(qGreen(a) - qGreen(b)) <= 1 && std::abs(qBlue(a) - qBlue(b)) <= 1;
-}
-
 // A world filled with pseudo-random opaque pixels.
 void scramble(World& world, quint32 seed)
 {

@@ -47,41 +47,6 @@ int windowsWidth(const char* text, int pixels)
     return sum;
 }
 
-// The rectangles a drawing call reports for its window, captured by giving the world a
-// stand-in window whose only hook records them.
-class DirtyRecorder {
-public:
-    explicit DirtyRecorder(GrafPtr port) : m_port(port)
-    {
-        sRecorder = this;
-        Private::PortWindowHooks hooks;
-        hooks.markDirty = [](AQtWindow*, const QRect& r) { sRecorder->m_dirty |= r; };
-        m_previous = Private::setPortWindowHooks(hooks);
-        m_port->window = reinterpret_cast<AQtWindow*>(this);
-    }
-    ~DirtyRecorder()
-    {
-        m_port->window = nullptr;
-        Private::setPortWindowHooks(m_previous);
-        sRecorder = nullptr;
-    }
-    QRect dirty() const { return m_dirty; }
-
-private:
-    static inline DirtyRecorder* sRecorder = nullptr;
-    GrafPtr m_port;
-    QRect m_dirty;
-    Private::PortWindowHooks m_previous;
-};
-
-QRect boundingBox(const QSet<QPoint>& pixels)
-{
-    QRect box;
-    for (const QPoint& p : pixels)
-        box |= QRect(p, QSize(1, 1));
-    return box;
-}
-
 int penH()
 {
     Point p{};
