@@ -20,7 +20,9 @@ if ! command -v gcovr >/dev/null 2>&1; then
   fi
 fi
 export VELMAR_BUILD_DIR="${VELMAR_COVERAGE_BUILD_DIR:-$root/build-coverage}"
-export VELMAR_CMAKE_ARGS="-DCMAKE_BUILD_TYPE=Debug -DCMAKE_CXX_FLAGS=--coverage -DCMAKE_C_FLAGS=--coverage
+# C++ only: the library is C++, and the classic C test programs are compiled by clang, whose
+# coverage runtime the C++ linker does not bring.
+export VELMAR_CMAKE_ARGS="-DCMAKE_BUILD_TYPE=Debug -DCMAKE_CXX_FLAGS=--coverage
   -DCMAKE_EXE_LINKER_FLAGS=--coverage -DCMAKE_SHARED_LINKER_FLAGS=--coverage
   -DVELMAR_BUILD_BENCH=OFF -DVELMAR_BUILD_EXAMPLES=OFF ${VELMAR_CMAKE_ARGS:-}"
 source "$root/scripts/prepare.sh"
