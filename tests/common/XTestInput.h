@@ -4,6 +4,7 @@
 
 #include <QGuiApplication>
 #include <QPoint>
+#include <QTest>
 
 #if defined(Q_OS_UNIX)
 #include <dlfcn.h>
@@ -55,6 +56,27 @@ public:
     {
         m_fakeMotion(m_display, -1, global.x(), global.y(), 0);
         m_sync(m_display, 0);
+    }
+    // A left click at a global point, once the pointer has had `settleMs` to get there.
+    void click(const QPoint& global, int settleMs = 50)
+    {
+        moveTo(global);
+        QTest::qWait(settleMs);
+        button(1, true);
+        button(1, false);
+    }
+    // Latin-1 text typed key by key (those characters are their own keysyms).
+    void type(const char* text)
+    {
+        for (const char* c = text; *c; ++c)
+            tap(static_cast<unsigned char>(*c));
+    }
+    // A key tapped while a modifier is held.
+    void chord(unsigned long modifier, unsigned long keysym)
+    {
+        key(modifier, true);
+        tap(keysym);
+        key(modifier, false);
     }
 
 private:

@@ -157,28 +157,11 @@ private Q_SLOTS:
         QTest::addColumn<int>("id");
         QTest::addColumn<Qt::CursorShape>("shape");
 
-        const struct {
-            Qt::CursorShape shape;
-            int id;
-            std::initializer_list<ThemeCursor> themes;
-        } groups[] = {
-            {Qt::ArrowCursor, 0, {0, 1, 11, 12, 13, 22, 0xFFFFFFFFu}},
-            {Qt::BitmapCursor, 6609, {2}},
-            {Qt::BitmapCursor, 6610, {3}},
-            {Qt::IBeamCursor, 1, {4}},
-            {Qt::CrossCursor, 2, {5}},
-            {Qt::BitmapCursor, 6608, {6}},
-            {Qt::WaitCursor, 4, {7, 14}},
-            {Qt::ClosedHandCursor, 8, {8}},
-            {Qt::OpenHandCursor, 9, {9}},
-            {Qt::BitmapCursor, 13, {10}},
-            {Qt::SizeHorCursor, 17, {15, 16, 17}},
-            {Qt::ForbiddenCursor, 18, {18}},
-            {Qt::SizeVerCursor, 21, {19, 20, 21}},
-        };
-        for (const auto& group : groups)
-            for (ThemeCursor theme : group.themes)
-                QTest::addRow("theme %u", theme) << theme << group.id << group.shape;
+        // One row per rule; the theme-to-ID list itself is a table, not a rule to restate.
+        QTest::newRow("a shape of Qt's") << ThemeCursor(4) << 1 << Qt::IBeamCursor;
+        QTest::newRow("a picture of ours") << ThemeCursor(2) << 6609 << Qt::BitmapCursor;
+        QTest::newRow("several themes, one cursor") << ThemeCursor(16) << 17 << Qt::SizeHorCursor;
+        QTest::newRow("beyond the list: the arrow") << ThemeCursor(0xFFFFFFFFu) << 0 << Qt::ArrowCursor;
     }
     void themeCursors()
     {
@@ -201,7 +184,6 @@ private Q_SLOTS:
         QTest::addColumn<int>("id");
         QTest::addColumn<Qt::CursorShape>("shape");
         QTest::newRow("3 cross") << 3 << Qt::CrossCursor;
-        QTest::newRow("10 pointing hand") << 10 << Qt::PointingHandCursor;
         QTest::newRow("2010 diagonal size") << 2010 << Qt::SizeFDiagCursor;
         QTest::newRow("13 picture") << 13 << Qt::BitmapCursor;
         QTest::newRow("no picture") << 12345 << Qt::ArrowCursor;

@@ -333,12 +333,7 @@ private Q_SLOTS:
         log() << QString::number(RemoveEventFromQueue(nullptr, second.get()));
         log() << QStringLiteral("refs %1").arg(second->refCount);
         QCOMPARE(log(), (QStringList{"0", "0", "0", "0", "-9868", "refs 1"}));
-        QCOMPARE(FlushSpecificEventsFromQueue(nullptr, matchesNothing, nullptr), OSStatus(eventInternalErr));
-        QCOMPARE(FlushSpecificEventsFromQueue(GetMainEventQueue(), nullptr, nullptr), OSStatus(eventInternalErr));
-        QCOMPARE(FindSpecificEventInQueue(nullptr, matchesNothing, nullptr), EventRef(nullptr));
-        QCOMPARE(FindSpecificEventInQueue(GetMainEventQueue(), nullptr, nullptr), EventRef(nullptr));
         QCOMPARE(FindSpecificEventInQueue(GetMainEventQueue(), matchesNothing, nullptr), EventRef(nullptr));
-        QCOMPARE(GetNumEventsInQueue(nullptr), 0u);
         QVERIFY(NewEventComparatorUPP(matchesNothing) == &matchesNothing);
         Private::ScheduleEvent(EventQueueItemSmartPtr(), EventQueueItem::NoMerge);
         Private::FlushEventReferences(nullptr);

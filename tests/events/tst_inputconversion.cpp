@@ -170,14 +170,11 @@ private Q_SLOTS:
         QTest::newRow("digit 7") << int(Qt::Key_7) << 0 << "7" << "1 37/1a";
         QTest::newRow("keypad 7") << int(Qt::Key_7) << kPad << "7" << "1 37/59";
         QTest::newRow("keypad point") << int(Qt::Key_Period) << kPad << "." << "1 2e/41";
-        QTest::newRow("keypad times") << int(Qt::Key_Asterisk) << kPad << "*" << "1 2a/43";
         QTest::newRow("keypad enter") << int(Qt::Key_Enter) << kPad << "\r" << "1 03/4c";
         QTest::newRow("!") << int(Qt::Key_Exclam) << kShift << "!" << "1 21/12 shift";
-        QTest::newRow("~") << int(Qt::Key_AsciiTilde) << kShift << "~" << "1 7e/32 shift";
         QTest::newRow("F5 has no text") << int(Qt::Key_F5) << 0 << "" << "1 10/60";
         QTest::newRow("F15") << int(Qt::Key_F15) << 0 << "" << "1 10/71";
         QTest::newRow("left arrow") << int(Qt::Key_Left) << 0 << "" << "1 1c/7b";
-        QTest::newRow("page down") << int(Qt::Key_PageDown) << 0 << "" << "1 0c/79";
         QTest::newRow("return") << int(Qt::Key_Return) << 0 << "\r" << "1 0d/24";
         QTest::newRow("backspace") << int(Qt::Key_Backspace) << 0 << "\b" << "1 08/33";
         QTest::newRow("shift-tab") << int(Qt::Key_Backtab) << kShift << "" << "1 09/30 shift";
@@ -186,13 +183,7 @@ private Q_SLOTS:
         // Qt's mapper gives Clear to VK_OEM_CLEAR too, and the later key wins: an empty row.
         QTest::newRow("clear") << int(Qt::Key_Clear) << kPad << "" << "1 00/00";
         QTest::newRow("option-g") << int(Qt::Key_G) << kAlt << "\u00a9" << "1 a9/05 option";
-        QTest::newRow("euro") << int(Qt::Key_2) << (kAlt | kShift) << "\u20ac" << "1 db/13 shift option";
-        QTest::newRow("apple") << int(Qt::Key_K) << (kAlt | kShift) << "\uf8ff" << "1 f0/28 shift option";
-        QTest::newRow("en dash") << int(Qt::Key_Minus) << kAlt << "\u2013" << "1 d0/1b option";
         QTest::newRow("em dash") << int(Qt::Key_Minus) << (kAlt | kShift) << "\u2014" << "1 d1/1b shift option";
-        QTest::newRow("left quote") << int(Qt::Key_BracketRight) << kAlt << "\u2018" << "1 d4/1e option";
-        QTest::newRow("right quote") << int(Qt::Key_BracketRight) << (kAlt | kShift) << "\u2019" << "1 d5/1e shift option";
-        QTest::newRow("I circumflex") << int(Qt::Key_D) << (kAlt | kShift) << "\u00ce" << "1 eb/02 shift option";
         QTest::newRow("no-break space") << int(Qt::Key_Space) << kAlt << "\u00a0" << "1 ca/31 option";
         QTest::newRow("e acute is not one key") << int(Qt::Key_E) << 0 << "\u00e9" << "1 45/0e";
         // Control-typed letters are control characters: the Qt key decides.
@@ -201,9 +192,6 @@ private Q_SLOTS:
         // Both Windows keys are Qt's Meta, whose index entry is the right Windows key.
         QTest::newRow("meta") << int(Qt::Key_Meta) << kMeta << "" << "1 00/3c cmd";
         QTest::newRow("shift alone") << int(Qt::Key_Shift) << kShift << "" << "none";
-        QTest::newRow("control alone") << int(Qt::Key_Control) << kCtrl << "" << "none";
-        QTest::newRow("alt alone") << int(Qt::Key_Alt) << kAlt << "" << "none";
-        QTest::newRow("altgr alone") << int(Qt::Key_AltGr) << 0 << "" << "none";
         QTest::newRow("caps lock alone") << int(Qt::Key_CapsLock) << 0 << "" << "none";
     }
     void keys()
@@ -282,7 +270,6 @@ private Q_SLOTS:
         QTest::newRow("double click is a down") << int(QEvent::MouseButtonDblClick) << left << left << 0 << QPoint(5, 5) << "1 b1 p3 @105,205";
         QTest::newRow("release outside") << int(QEvent::MouseButtonRelease) << left << 0 << 0 << QPoint(50, 5) << "2 b1 p0 @150,205";
         QTest::newRow("right") << press << int(Qt::RightButton) << int(Qt::RightButton) << 0 << QPoint(1, 1) << "1 b2 p3 @101,201";
-        QTest::newRow("middle") << press << int(Qt::MiddleButton) << int(Qt::MiddleButton) << 0 << QPoint(1, 1) << "1 b3 p3 @101,201";
         QTest::newRow("x2") << press << int(Qt::XButton2) << int(Qt::XButton2) << 0 << QPoint(1, 1) << "1 b5 p3 @101,201";
         QTest::newRow("shift-click") << press << left << left << kShift << QPoint(1, 1) << "1 b1 p3 shift @101,201";
         QTest::newRow("command-click") << press << left << left << kCtrl << QPoint(1, 1) << "1 b1 p3 cmd @101,201";
@@ -394,7 +381,6 @@ private Q_SLOTS:
         QTest::newRow("shift-S") << int(Qt::Key_S) << kShift << "01 38" << "01 38";
         QTest::newRow("control is command") << int(Qt::Key_Control) << kCtrl << "37" << "37";
         QTest::newRow("alt is option") << int(Qt::Key_Alt) << kAlt << "3a" << "3a";
-        QTest::newRow("escape") << int(Qt::Key_Escape) << 0 << "35" << "35";
         QTest::newRow("F2") << int(Qt::Key_F2) << 0 << "78" << "78";
         // Insert also sets 56 for the host; its own code 72 answers for Help.
         QTest::newRow("insert") << int(Qt::Key_Insert) << 0 << "56 72" << "";
@@ -483,7 +469,6 @@ private Q_SLOTS:
         QTest::addColumn<int>("ms");
         QTest::addColumn<int>("ticks");
         QTest::newRow("Qt's default") << 400 << 24;
-        QTest::newRow("half a second") << 500 << 30;
         QTest::newRow("truncated") << 249 << 14;
     }
     void timing()

@@ -122,9 +122,9 @@ private Q_SLOTS:
     void choosingWithTheMouse()
     {
         QMenuBar* bar = AQtApplication::instance()->menuBar();
-        click(bar->mapToGlobal(bar->actionGeometry(m_file->menuAction()).center()));
+        m_x.click(bar->mapToGlobal(bar->actionGeometry(m_file->menuAction()).center()));
         QTRY_VERIFY(m_file->isVisible());
-        click(m_file->mapToGlobal(m_file->actionGeometry(m_file->actions().at(1)).center()));
+        m_x.click(m_file->mapToGlobal(m_file->actionGeometry(m_file->actions().at(1)).center()));
         runLoop([] { return seen("again 0"); });
         VELMAR_COMPARE_SEQUENCE(
             gSeen, "menu bar choice", {"update menus", "*", "chosen 128/2", "again 0"});
@@ -134,12 +134,10 @@ private Q_SLOTS:
     // gets the choice as a menu event, otherwise as a key-down for MenuEvent: once either way.
     void commandKeys()
     {
-        click(m_window->mapToGlobal(QPoint(50, 50)));
+        m_x.click(m_window->mapToGlobal(QPoint(50, 50)));
         runLoop([] { return false; }, 300);
         gSeen.clear();
-        m_x.key(kControl, true);
-        m_x.tap('n');
-        m_x.key(kControl, false);
+        m_x.chord(kControl, 'n');
         runLoop([] { return seen("command key 128/1") || seen("again 0"); });
         runLoop([] { return false; }, 200);
         const QStringList choices =
@@ -198,14 +196,6 @@ private Q_SLOTS:
     }
 
 private:
-    void click(const QPoint& global)
-    {
-        m_x.moveTo(global);
-        QTest::qWait(50);
-        m_x.button(1, true);
-        m_x.button(1, false);
-    }
-
     VelmarTest::XTestInput m_x;
     MenuRef m_file;
     EventHandlerRef m_handler = nullptr;

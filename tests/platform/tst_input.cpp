@@ -1,6 +1,9 @@
-// Key and button state: the event-fed tracker, and the platform calls on top of it and of
-// the X server.
+// Key and button state: the event-fed tracker, the platform calls on top of it, and the X11
+// backend against a real server (keys and buttons pressed through XTEST; run on a display of
+// its own).
 #include "TestSupport.h"
+#include "WindowSystemNeeds.h"
+#include "XTestInput.h"
 
 #include "platform/InputTracker.h"
 #include "platform/Notices.h"
@@ -9,10 +12,14 @@
 #include "platform/WindowSystem.h"
 #include "platform/x11/XcbKeyboard.h"
 
+#include <Velmar/Events.h>
+
 #include <QGuiApplication>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QWidget>
+
+#include <utility>
 
 using namespace Velmar::Private;
 namespace VK = Velmar::Private::VirtualKey;
@@ -65,6 +72,7 @@ private Q_SLOTS:
     }
     void cleanup()
     {
+        releaseRealInput();
         Platform::setWindowSystemInputEnabled(true);
         InputTracker::instance().reset();
     }
@@ -206,7 +214,6 @@ private Q_SLOTS:
         QTest::newRow("wayland") << QString("wayland") << int(WindowSystem::Wayland);
         QTest::newRow("wayland-egl") << QString("wayland-egl") << int(WindowSystem::Wayland);
         QTest::newRow("offscreen") << QString("offscreen") << int(WindowSystem::Other);
-        QTest::newRow("minimal") << QString("minimal") << int(WindowSystem::Other);
         QTest::newRow("windows") << QString("windows") << int(WindowSystem::Windows);
         QTest::newRow("none") << QString("") << int(WindowSystem::None);
     }
@@ -263,6 +270,98 @@ private Q_SLOTS:
         QCOMPARE(gNotices.size(), 1);
         QVERIFY(gNotices.first().startsWith("Velmar::MoveWindow: "));
     }
+
+    // Real keys through the X server: the key, its generic modifier and nothing else are down.
+    void realKeys_data()
+    {
+        QTest::addColumn<qulonglong>("keysym");
+        QTest::addColumn<int>("vk");
+        QTest::addColumn<int>("genericVk");
+        QTest::newRow("a") << 0x61ull << int(VK::A) << 0;
+        QTest::newRow("F2") << 0xffbfull << VK::F1 + 1 << 0;
+        QTest::newRow("Up") << 0xff52ull << int(VK::Up) << 0;
+        QTest::newRow("Shift_L") << 0xffe1ull << int(VK::LShift) << int(VK::Shift);
+        QTest::newRow("Control_R") << 0xffe4ull << int(VK::RControl) << int(VK::Control);
+    }
+    void realKeys()
+    {
+        QFETCH(qulonglong, keysym);
+        QFETCH(int, vk);
+        QFETCH(int, genericVk);
+        startRealInput();
+        QVERIFY(!Platform::isAsyncKeyDown(vk));
+        m_xtest.key(keysym, true);
+        QVERIFY(Platform::isAsyncKeyDown(vk));
+        QVERIFY(!genericVk || Platform::isAsyncKeyDown(genericVk));
+        UInt8 state[256];
+        Platform::getKeyboardState(state);
+        int down = 0;
+        for (int i = 0; i < 256; ++i)
+            down += (state[i] & 0x80) ? 1 : 0;
+        QCOMPARE(int(state[vk] & 0x80), 0x80);
+        QCOMPARE(down, genericVk ? 2 : 1);
+        m_xtest.key(keysym, false);
+        QVERIFY(!Platform::isAsyncKeyDown(vk));
+    }
+
+    // Caps Lock toggles in every call that reports it; the keypad's 7 is Home with Num Lock
+    // off and VK_NUMPAD7 with it on, as on Windows; the left button is the server's.
+    void realLocksAndButton()
+    {
+        startRealInput();
+        const bool caps = Platform::isCapsLockToggled();
+        m_xtest.tap(0xffe5);
+        QCOMPARE(Platform::isCapsLockToggled(), !caps);
+        QCOMPARE((Velmar::GetCurrentKeyModifiers() & Velmar::alphaLock) != 0, !caps);
+        UInt8 state[256];
+        Platform::getKeyboardState(state);
+        QCOMPARE(int(state[VK::Capital] & 0x01), caps ? 0 : 1);
+        m_xtest.tap(0xffe5);
+        QCOMPARE(Platform::isCapsLockToggled(), caps);
+
+        const bool numLock = state[VK::NumLock] & 0x01;
+        for (bool on : {false, true}) {
+            Platform::getKeyboardState(state);
+            if (bool(state[VK::NumLock] & 0x01) != on)
+                m_xtest.tap(0xff7f);
+            m_xtest.key(0xff95, true); // the key of KP_Home / KP_7
+            QCOMPARE(Platform::isAsyncKeyDown(VK::Home), !on);
+            QCOMPARE(Platform::isAsyncKeyDown(VK::Numpad0 + 7), on);
+            m_xtest.key(0xff95, false);
+        }
+        if (!numLock)
+            m_xtest.tap(0xff7f);
+
+        QVERIFY(!Platform::isSystemLeftButtonDown());
+        m_xtest.button(1, true);
+        QVERIFY(Platform::isSystemLeftButtonDown());
+        QVERIFY(Platform::isAsyncKeyDown(VK::LButton));
+        QVERIFY(!Platform::isAsyncKeyDown(VK::RButton));
+        m_xtest.button(1, false);
+        QVERIFY(!Platform::isSystemLeftButtonDown());
+    }
+
+private:
+    void startRealInput()
+    {
+        VELMAR_REQUIRE_X11("XTEST input");
+        if (!m_xtest.load())
+            QSKIP("XTEST (libXtst.so.6) not available");
+        Platform::setWindowSystemInputEnabled(true);
+        m_realInput = true;
+    }
+    // Never leaves a key or button held on the display, whatever failed.
+    void releaseRealInput()
+    {
+        if (!std::exchange(m_realInput, false))
+            return;
+        for (unsigned long keysym : {0x61ul, 0xffe1ul, 0xffe4ul, 0xffbful, 0xff52ul, 0xff95ul})
+            m_xtest.key(keysym, false);
+        m_xtest.button(1, false);
+    }
+
+    VelmarTest::XTestInput m_xtest;
+    bool m_realInput = false;
 };
 
 VELMAR_TEST_MAIN(InputTest)

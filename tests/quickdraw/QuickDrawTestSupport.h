@@ -17,6 +17,7 @@
 #include <QPolygon>
 #include <QSet>
 
+#include <cstdlib>
 #include <memory>
 
 namespace QDTest {
@@ -100,6 +101,49 @@ inline QByteArray describe(const QSet<QPoint>& pixels)
     return QStringLiteral("%1@%2,%3 %4x%5").arg(pixels.size()).arg(box.x()).arg(box.y())
         .arg(box.width()).arg(box.height()).toLatin1();
 }
+
+// The bounding box of a pixel set.
+inline QRect boundingBox(const QSet<QPoint>& pixels)
+{
+    QRect box;
+    for (const QPoint& p : pixels)
+        box |= QRect(p, QSize(1, 1));
+    return box;
+}
+
+// Channels within one step (what rounding may give either way), alpha equal.
+inline bool near(QRgb a, QRgb b)
+{
+    return qAlpha(a) == qAlpha(b) && std::abs(qRed(a) - qRed(b)) <= 1
+        && std::abs(qGreen(a) - qGreen(b)) <= 1 && std::abs(qBlue(a) - qBlue(b)) <= 1;
+}
+
+// The rectangles a drawing call reports for its window: the world gets a stand-in window
+// whose only hook records them.
+class DirtyRecorder {
+public:
+    explicit DirtyRecorder(Velmar::GrafPtr port) : m_port(port)
+    {
+        sDirty = QRect();
+        Velmar::Private::PortWindowHooks hooks;
+        hooks.markDirty = [](Velmar::AQtWindow*, const QRect& r) { sDirty |= r; };
+        m_previous = Velmar::Private::setPortWindowHooks(hooks);
+        m_port->window = reinterpret_cast<Velmar::AQtWindow*>(this);
+    }
+    ~DirtyRecorder()
+    {
+        m_port->window = nullptr;
+        Velmar::Private::setPortWindowHooks(m_previous);
+    }
+    DirtyRecorder(const DirtyRecorder&) = delete;
+    DirtyRecorder& operator=(const DirtyRecorder&) = delete;
+    QRect dirty() const { return sDirty; }
+
+private:
+    static inline QRect sDirty;
+    Velmar::GrafPtr m_port;
+    Velmar::Private::PortWindowHooks m_previous;
+};
 
 // An owned region handle holding `region`.
 struct RgnDeleter {

@@ -77,12 +77,6 @@ QRgb expectedPixel(SInt16 mode, QRgb s, QRgb d, const Ink& ink)
     return qRgb(c[0], c[1], c[2]);
 }
 
-bool near(QRgb a, QRgb b)
-{
-    return qAlpha(a) == qAlpha(b) && std::abs(qRed(a) - qRed(b)) <= 1
-        && std::abs(qGreen(a) - qGreen(b)) <= 1 && std::abs(qBlue(a) - qBlue(b)) <= 1;
-}
-
 // A world filled with pseudo-random opaque pixels.
 void scramble(World& world, quint32 seed)
 {
@@ -402,7 +396,6 @@ private Q_SLOTS:
         const BitMapPtr& from = GetPortBitMapForCopyBits(src);
         const std::pair<const char*, std::function<void()>> calls[] = {
             {"null source", [&] { CopyBits(nullptr, to, &eight, &eight, srcCopy, nullptr); }},
-            {"null port's map", [&] { CopyBits(GetPortBitMapForCopyBits(nullptr), to, &eight, &eight, srcCopy, nullptr); }},
             {"stale pixmap", [&] { CopyBits(stale, to, &eight, &eight, srcCopy, nullptr); }},
             {"freed pixmap", [&] { CopyBits(from, freed, &eight, &eight, srcCopy, nullptr); }},
             {"pixmap without pixels", [&] { CopyBits(empty, to, &eight, &eight, srcCopy, nullptr); }},

@@ -74,33 +74,6 @@ private Q_SLOTS:
         QVERIFY(!IsValidPort(world));
     }
 
-    void nullAndStaleArguments()
-    {
-        VelmarTest::ScriptedAutomationListener answers;
-        DisposeGWorld(nullptr);
-        QCOMPARE(answers.questions().size(), 1);
-        QVERIFY(answers.questions().first().text.contains(
-            QStringLiteral("offscreenGWorld != NULL && offscreenGWorld->window == NULL")));
-        GrafPtr world = nullptr;
-        NewGWorld(&world, 0, nullptr, nullptr, nullptr, 0);
-        QCOMPARE(boundsOf(world), QStringLiteral("0,0,1,1"));
-        DisposeGWorld(world);
-        DisposeGWorld(world); // stale: refused, no double free
-        DisposePort(world);
-        DisposePort(nullptr);
-        QVERIFY(!GetPortPixMap(nullptr));
-        QVERIFY(!GetPortBitMapForCopyBits(nullptr).image());
-        QVERIFY(answers.questions().last().text.contains(QStringLiteral("port != NULL")));
-        // No place to put the world: nothing leaks into the port list, nothing crashes.
-        const auto before = Private::livePorts().size();
-        QCOMPARE(NewGWorld(nullptr, 0, nullptr, nullptr, nullptr, 0), SInt16(0));
-        QCOMPARE(Private::livePorts().size(), before);
-        Rect r = makeRect(1, 2, 3, 4);
-        QCOMPARE(GetPortBounds(nullptr, &r), &r);
-        QCOMPARE(text(r), QStringLiteral("0,0,0,0"));
-        QCOMPARE(GetPortBounds(nullptr, nullptr), nullptr);
-    }
-
     void hugeWorldIsRefusedNotFatal()
     {
         VelmarTest::LogCapture log;

@@ -93,22 +93,6 @@ private Q_SLOTS:
         }
     }
 
-    void nullPolygonsAreSafe()
-    {
-        World world;
-        VelmarTest::LogCapture log;
-        KillPoly(nullptr);
-        OffsetPoly(nullptr, 1, 1);
-        for (auto call : {FramePoly, PaintPoly, ErasePoly, InvertPoly})
-            call(nullptr);
-        FillPoly(nullptr, GetQDGlobalsBlack(nullptr));
-        PolyPtr* const none = nullptr;
-        const Rect box = GetPolyBBox(none);
-        QVERIFY(box.left == 0 && box.right == 0);
-        GetPolyRect(nullptr, nullptr);
-        QVERIFY(log.contains("PaintPoly"));
-    }
-
     // A nested OpenPoly asserts and reopens; closing without opening is logged; killing the
     // open polygon stops the recording, so that later lines draw instead of writing into freed
     // memory; without a port OpenPoly asserts and gives a polygon that records nothing.

@@ -94,19 +94,6 @@ private Q_SLOTS:
             QVERIFY2(PtInRect(P(h, v), &r) == in, QByteArray::number(h) + "," + QByteArray::number(v));
     }
 
-    void nullPointersAreSafe()
-    {
-        VelmarTest::LogCapture log;
-        SetRect(nullptr, 1, 2, 3, 4);
-        OffsetRect(nullptr, 1, 1);
-        QVERIFY(log.contains("OffsetRect"));
-        InsetRect(nullptr, 1, 1);
-        QCOMPARE(EmptyRect(nullptr), 1);
-        const Rect a = R(0, 0, 10, 10);
-        UnionRect(&a, &a, nullptr);
-        QCOMPARE(PtInRect(P(15, 15), nullptr), 0);
-        Pt2Rect(P(1, 1), P(2, 2), nullptr);
-    }
 };
 
 VELMAR_TEST_MAIN(TestRectUtils)

@@ -14,23 +14,14 @@
 
 using namespace Velmar;
 using namespace QDTest;
+using VelmarTest::P;
+using VelmarTest::pascal;
 
 namespace {
 
 Palette::PaletteManager& palette()
 {
     return *Palette::PaletteManager::Instance();
-}
-
-// A Pascal string of Latin-1 text.
-QByteArray pascal(const char* text)
-{
-    QByteArray p(1, char(std::strlen(text)));
-    return p + text;
-}
-const unsigned char* P(const QByteArray& p)
-{
-    return reinterpret_cast<const unsigned char*>(p.constData());
 }
 
 // Advance widths of Arial's glyphs in thousandths of an em (the same as Helvetica's).
@@ -54,41 +45,6 @@ int windowsWidth(const char* text, int pixels)
         sum += int(std::lround(units * pixels / 2048.0));
     }
     return sum;
-}
-
-// The rectangles a drawing call reports for its window, captured by giving the world a
-// stand-in window whose only hook records them.
-class DirtyRecorder {
-public:
-    explicit DirtyRecorder(GrafPtr port) : m_port(port)
-    {
-        sRecorder = this;
-        Private::PortWindowHooks hooks;
-        hooks.markDirty = [](AQtWindow*, const QRect& r) { sRecorder->m_dirty |= r; };
-        m_previous = Private::setPortWindowHooks(hooks);
-        m_port->window = reinterpret_cast<AQtWindow*>(this);
-    }
-    ~DirtyRecorder()
-    {
-        m_port->window = nullptr;
-        Private::setPortWindowHooks(m_previous);
-        sRecorder = nullptr;
-    }
-    QRect dirty() const { return m_dirty; }
-
-private:
-    static inline DirtyRecorder* sRecorder = nullptr;
-    GrafPtr m_port;
-    QRect m_dirty;
-    Private::PortWindowHooks m_previous;
-};
-
-QRect boundingBox(const QSet<QPoint>& pixels)
-{
-    QRect box;
-    for (const QPoint& p : pixels)
-        box |= QRect(p, QSize(1, 1));
-    return box;
 }
 
 int penH()
@@ -152,43 +108,29 @@ private Q_SLOTS:
         QTest::addColumn<double>("points");
         QTest::addColumn<int>("gotFace"); // read back from the QFont
 
-        QTest::newRow("geneva") << 3 << 12 << 0 << false << ""
-                                << ""
-                                << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("monaco") << 4 << 10 << 0 << false << ""
-                                << ""
-                                << "Courier New" << 2 << 7.5 << 0;
-        QTest::newRow("app name wins") << 4 << 12 << 0 << true << "AppFontNameWin"
-                                       << "Arial"
-                                       << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("geneva") << 3 << 12 << 0 << false << "" << "" << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("monaco") << 4 << 10 << 0 << false << "" << "" << "Courier New" << 2 << 7.5
+            << 0;
+        QTest::newRow("app name wins") << 4 << 12 << 0 << true << "AppFontNameWin" << "Arial"
+            << "Arial" << 3 << 9.0 << 0;
         QTest::newRow("app name by toolbox name") << 22 << 12 << 0 << true << "AppFontNameWin"
-                                                  << "Times"
-                                                  << "Times New Roman" << 1 << 9.0 << 0;
-        QTest::newRow("app name unknown")
-            << 4 << 12 << 0 << true << "AppFontNameWin"
-            << "Nope" << QGuiApplication::font().family() << 3 << 9.0 << 0;
-        QTest::newRow("app size") << 3 << 12 << 0 << true << "AppFontSizeLarge"
-                                  << "14"
-                                  << "Arial" << 3 << 10.5 << 0;
-        QTest::newRow("app size not asked") << 3 << 12 << 0 << false << "AppFontSizeLarge"
-                                            << "14"
-                                            << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("humongous") << 3 << 64 << 0 << true << "AppFontSizeHumongous"
-                                   << "96"
-                                   << "Arial" << 3 << 72.0 << 0;
-        QTest::newRow("bold underline") << 3 << 12 << (bold | underline) << false << ""
-                                        << ""
-                                        << "Arial" << 3 << 9.0 << (bold | underline);
-        QTest::newRow("italic outline condense")
-            << 3 << 12 << (italic | outline | condense) << false << ""
-            << ""
-            << "Arial" << 3 << 9.0 << (italic | outline | condense);
-        QTest::newRow("shadow extend nothing") << 3 << 12 << (shadow | extend) << false << ""
-                                               << ""
-                                               << "Arial" << 3 << 9.0 << 0;
-        QTest::newRow("face is a byte") << 3 << 12 << 0x101 << false << ""
-                                        << ""
-                                        << "Arial" << 3 << 9.0 << int(bold);
+            << "Times" << "Times New Roman" << 1 << 9.0 << 0;
+        QTest::newRow("app name unknown") << 4 << 12 << 0 << true << "AppFontNameWin" << "Nope"
+            << QGuiApplication::font().family() << 3 << 9.0 << 0;
+        QTest::newRow("app size") << 3 << 12 << 0 << true << "AppFontSizeLarge" << "14" << "Arial"
+            << 3 << 10.5 << 0;
+        QTest::newRow("app size not asked") << 3 << 12 << 0 << false << "AppFontSizeLarge" << "14"
+            << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("humongous") << 3 << 64 << 0 << true << "AppFontSizeHumongous" << "96"
+            << "Arial" << 3 << 72.0 << 0;
+        QTest::newRow("bold underline") << 3 << 12 << (bold | underline) << false << "" << ""
+            << "Arial" << 3 << 9.0 << (bold | underline);
+        QTest::newRow("italic outline condense") << 3 << 12 << (italic | outline | condense)
+            << false << "" << "" << "Arial" << 3 << 9.0 << (italic | outline | condense);
+        QTest::newRow("shadow extend nothing") << 3 << 12 << (shadow | extend) << false << "" << ""
+            << "Arial" << 3 << 9.0 << 0;
+        QTest::newRow("face is a byte") << 3 << 12 << 0x101 << false << "" << "" << "Arial" << 3
+            << 9.0 << int(bold);
     }
 
     void fontRules()

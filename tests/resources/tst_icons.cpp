@@ -30,13 +30,6 @@ void setForeColor(QRgb rgb)
     RGBForeColor(&c);
 }
 
-// Channels within one step: what blending at alpha 128 may round either way.
-bool near(QRgb a, QRgb b)
-{
-    return qAbs(qRed(a) - qRed(b)) <= 1 && qAbs(qGreen(a) - qGreen(b)) <= 1
-        && qAbs(qBlue(a) - qBlue(b)) <= 1 && qAlpha(a) == qAlpha(b);
-}
-
 QPoint centreOf(const Rect& r)
 {
     return Private::toQRect(r).center();
@@ -46,31 +39,6 @@ QByteArray hex(QRgb rgb)
 {
     return QByteArray::number(rgb, 16);
 }
-
-// The rectangles a drawing call reports for its window: the world gets a stand-in window
-// whose only hook records them.
-class DirtyRecorder {
-public:
-    explicit DirtyRecorder(GrafPtr port) : m_port(port)
-    {
-        sDirty = QRect();
-        Private::PortWindowHooks hooks;
-        hooks.markDirty = [](AQtWindow*, const QRect& r) { sDirty |= r; };
-        m_previous = Private::setPortWindowHooks(hooks);
-        m_port->window = reinterpret_cast<AQtWindow*>(this);
-    }
-    ~DirtyRecorder()
-    {
-        m_port->window = nullptr;
-        Private::setPortWindowHooks(m_previous);
-    }
-    QRect dirty() const { return sDirty; }
-
-private:
-    static inline QRect sDirty;
-    GrafPtr m_port;
-    Private::PortWindowHooks m_previous;
-};
 
 } // namespace
 

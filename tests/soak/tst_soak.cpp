@@ -1,6 +1,7 @@
 // A seeded soak: random sequences of valid calls across drawing, regions, the queue, handlers,
-// timers and windows for a bounded time, each step checked against a small model of what must hold,
-// and resident memory checked to stop growing once the caches are warm.
+// timers and windows for a bounded time (a crash, a sanitizer report or a refused valid call
+// is a failure), and resident memory checked to stop growing once the caches are warm. What
+// each call answers is the unit tests' and the fuzzers' business.
 //     VELMAR_SOAK_SEED=n      replays one run (the seed is printed either way)
 //     VELMAR_SOAK_SECONDS=s   how long to run (10 by default)
 #include "TestSupport.h"
@@ -19,10 +20,8 @@
 #include <QElapsedTimer>
 #include <QFile>
 #include <QRandomGenerator>
-#include <QRegion>
 
-#include <map>
-#include <set>
+#include <functional>
 #include <vector>
 
 using namespace Velmar;
@@ -56,21 +55,12 @@ constexpr bool kMemoryMeasurable =
     true;
 #endif
 
-struct Soak;
-Soak* gSoak = nullptr;
-
 struct Soak {
     QRandomGenerator rng;
     GrafPtr world = nullptr;
-    std::vector<std::pair<RgnHandle, QRegion>> regions; // each handle with its model
-    std::vector<std::pair<EventHandlerRef, int>> handlers; // with their ids, oldest first
-    int nextHandlerId = 0;
-    QStringList calls; // handlers run by the last send
-    std::set<EventLoopTimerRef> timers;
-    std::set<EventLoopTimerRef> removedTimers;
-    int lateFirings = 0; // removed timers that still fired
-    int queuedKeys = 0; // our keyDowns in the queue
-    int queuedCarbon = 0; // our Carbon events in the queue
+    std::vector<RgnHandle> regions;
+    std::vector<EventHandlerRef> handlers;
+    std::vector<EventLoopTimerRef> timers;
     std::vector<WindowRef> windows;
     UInt32 steps = 0;
 
@@ -83,154 +73,66 @@ struct Soak {
         const SInt16 top = coord(), left = coord();
         return Rect{top, left, SInt16(top + pick(120)), SInt16(left + pick(120))};
     }
-
-    static OSStatus handler(EventHandlerCallRef call, EventRef event, void* id)
+    template <typename T> T& any(std::vector<T>& v) { return v[size_t(pick(int(v.size())))]; }
+    template <typename T> T takeAny(std::vector<T>& v)
     {
-        gSoak->calls << QString::number(quintptr(id));
-        return CallNextEventHandler(call, event);
+        const size_t i = size_t(pick(int(v.size())));
+        const T taken = v[i];
+        v.erase(v.begin() + long(i));
+        return taken;
     }
-    static void timerFired(EventLoopTimerRef timer, void*)
+
+    static OSStatus handler(EventHandlerCallRef call, EventRef event, void*)
     {
-        if (gSoak->removedTimers.count(timer))
-            ++gSoak->lateFirings;
+        return CallNextEventHandler(call, event);
     }
     static bool isOurs(EventRef event, void*) { return GetEventClass(event) == kSoakClass; }
 
     void draw()
     {
         const Rect r = rect();
-        switch (pick(6)) {
+        switch (pick(5)) {
         case 0: FrameRect(&r); break;
         case 1: PaintOval(&r); break;
         case 2: InvertRect(&r); break;
-        case 3:
-            MoveTo(r.left, r.top);
-            LineTo(r.right, r.bottom);
-            break;
-        case 4: PenSize(SInt16(pick(6)), SInt16(pick(6))); break;
-        default: {
-            // The one pixel oracle: a painted rectangle inside the port holds the pen colour.
-            // Components a byte can hold exactly (x * 257), so the round trip is exact.
-            const auto component = [this] { return UInt16(pick(256) * 257); };
-            const RGBColor colour{component(), component(), component()};
-            RGBForeColor(&colour);
-            PenNormal();
-            const Rect inside{10, 10, 20, 20};
-            PaintRect(&inside);
-            RGBColor got;
-            GetCPixel(15, 15, &got);
-            QCOMPARE(got.red, colour.red);
-            QCOMPARE(got.green, colour.green);
-            QCOMPARE(got.blue, colour.blue);
-            break;
-        }
+        case 3: MoveTo(r.left, r.top), LineTo(r.right, r.bottom); break;
+        default: PenSize(SInt16(pick(6)), SInt16(pick(6))); break;
         }
     }
 
     void regionStep()
     {
-        if (regions.size() < 2 || (regions.size() < 8 && pick(4) == 0)) {
-            regions.emplace_back(NewRgn(), QRegion());
-            return;
+        if (regions.size() < 2 || (regions.size() < 8 && pick(4) == 0))
+            return regions.push_back(NewRgn());
+        using Call = void (*)(RgnHandle, RgnHandle, RgnHandle);
+        static const Call kAlgebra[] = {UnionRgn, SectRgn, DiffRgn, XorRgn};
+        const Rect r = rect();
+        switch (pick(4)) {
+        case 0: RectRgn(any(regions), &r); break;
+        case 1: kAlgebra[pick(4)](any(regions), any(regions), any(regions)); break;
+        case 2: OffsetRgn(any(regions), SInt16(pick(40) - 20), SInt16(pick(40) - 20)); break;
+        default: DisposeRgn(takeAny(regions)); break;
         }
-        auto& [a, qa] = regions[size_t(pick(int(regions.size())))];
-        auto& [b, qb] = regions[size_t(pick(int(regions.size())))];
-        auto& [d, qd] = regions[size_t(pick(int(regions.size())))];
-        switch (pick(7)) {
-        case 0: {
-            const Rect r = rect();
-            RectRgn(a, &r);
-            qa = r.bottom > r.top && r.right > r.left
-                ? QRegion(r.left, r.top, r.right - r.left, r.bottom - r.top)
-                : QRegion();
-            break;
-        }
-        case 1:
-        case 2:
-        case 3:
-        case 4: {
-            // Each call against QRegion's own operation; the destination may be a source.
-            using Call = void (*)(RgnHandle, RgnHandle, RgnHandle);
-            using Model = QRegion (QRegion::*)(const QRegion&) const;
-            static const std::pair<Call, Model> kAlgebra[] = {{UnionRgn, &QRegion::united},
-                {SectRgn, &QRegion::intersected}, {DiffRgn, &QRegion::subtracted},
-                {XorRgn, &QRegion::xored}};
-            const auto& [call, model] = kAlgebra[pick(4)];
-            const QRegion q = (qa.*model)(qb);
-            call(a, b, d);
-            qd = q;
-            break;
-        }
-        case 5: {
-            const SInt16 dh = SInt16(pick(40) - 20), dv = SInt16(pick(40) - 20);
-            OffsetRgn(a, dh, dv);
-            qa.translate(dh, dv);
-            break;
-        }
-        default: {
-            const auto last = regions.back();
-            DisposeRgn(last.first);
-            regions.pop_back();
-            return;
-        }
-        }
-        for (const auto& [handle, model] : regions)
-            QVERIFY2(*handle == model,
-                qPrintable(QStringLiteral("region differs from its model at step %1").arg(steps)));
     }
 
     void queueStep()
     {
+        EventRecord record;
+        EventRef event = nullptr;
         switch (pick(5)) {
-        case 0:
-            if (PostEvent(keyDown, 0x61) == noErr)
-                ++queuedKeys;
-            break;
-        case 1: {
-            EventRecord record;
-            if (GetNextEvent(keyDownMask, &record)) {
-                QCOMPARE(int(record.what), int(keyDown));
-                --queuedKeys;
-            }
-            // A classic wait hands everything it was not asked for to the handlers.
-            queuedCarbon = 0;
-            break;
-        }
-        case 2: {
-            EventRef event = nullptr;
+        case 0: PostEvent(keyDown, 0x61); break; // refused when the queue is full
+        case 1: GetNextEvent(keyDownMask, &record); break;
+        case 2:
             QCOMPARE(MacCreateEvent(nullptr, kSoakClass, UInt32(pick(3)), 0, 0, &event), noErr);
-            if (PostEventToQueue(GetMainEventQueue(), event, 0) == noErr)
-                ++queuedCarbon;
+            PostEventToQueue(GetMainEventQueue(), event, 0);
             ReleaseEvent(event);
             break;
-        }
         case 3:
-            if (EventRef event = FindSpecificEventInQueue(GetMainEventQueue(), isOurs, nullptr)) {
+            if ((event = FindSpecificEventInQueue(GetMainEventQueue(), isOurs, nullptr)))
                 QCOMPARE(RemoveEventFromQueue(GetMainEventQueue(), event), noErr);
-                --queuedCarbon;
-            }
             break;
-        default:
-            if (pick(8) == 0) {
-                QCOMPARE(FlushSpecificEventsFromQueue(GetMainEventQueue(), isOurs, nullptr), noErr);
-                queuedCarbon = 0;
-            }
-            break;
+        default: FlushSpecificEventsFromQueue(GetMainEventQueue(), isOurs, nullptr); break;
         }
-        // Our Carbon events in the queue, counted by a comparator that never matches.
-        struct Counter {
-            int n = 0;
-        } counter;
-        FindSpecificEventInQueue(
-            GetMainEventQueue(),
-            [](EventRef e, void* data) {
-                if (GetEventClass(e) == kSoakClass)
-                    ++static_cast<Counter*>(data)->n;
-                return false;
-            },
-            &counter);
-        QCOMPARE(counter.n, queuedCarbon);
-        QVERIFY(GetNumEventsInQueue(GetMainEventQueue()) >= UInt32(queuedKeys + queuedCarbon));
     }
 
     void handlerStep()
@@ -238,27 +140,15 @@ struct Soak {
         if (handlers.empty() || (handlers.size() < 6 && pick(2) == 0)) {
             const EventTypeSpec type{kSoakClass, 7};
             EventHandlerRef ref = nullptr;
-            const int id = nextHandlerId++;
-            QCOMPARE(InstallEventHandler(GetApplicationEventTarget(), handler, 1, &type,
-                         reinterpret_cast<void*>(quintptr(id)), &ref),
-                noErr);
-            handlers.emplace_back(ref, id);
+            QCOMPARE(InstallEventHandler(GetApplicationEventTarget(), handler, 1, &type, nullptr, &ref), noErr);
+            handlers.push_back(ref);
         } else if (pick(3) == 0) {
-            const size_t i = size_t(pick(int(handlers.size())));
-            QCOMPARE(RemoveEventHandler(handlers[i].first), noErr);
-            handlers.erase(handlers.begin() + long(i));
+            QCOMPARE(RemoveEventHandler(takeAny(handlers)), noErr);
         }
-        // Every installed handler runs once per send, newest first, whatever was added or
-        // removed before.
         EventRef event = nullptr;
         MacCreateEvent(nullptr, kSoakClass, 7, 0, 0, &event);
-        calls.clear();
         SendEventToEventTarget(event, GetApplicationEventTarget());
         ReleaseEvent(event);
-        QStringList expected;
-        for (auto it = handlers.rbegin(); it != handlers.rend(); ++it)
-            expected << QString::number(it->second);
-        QCOMPARE(calls, expected);
     }
 
     void timerStep()
@@ -266,84 +156,50 @@ struct Soak {
         if (timers.size() < 4 && pick(2) == 0) {
             EventLoopTimerRef timer = nullptr;
             QCOMPARE(InstallEventLoopTimer(GetMainEventLoop(), pick(3) * 0.001, pick(2) * 0.002,
-                         timerFired, nullptr, &timer),
-                noErr);
-            timers.insert(timer);
-            removedTimers.erase(timer); // an address may be reused
+                         [](EventLoopTimerRef, void*) {}, nullptr, &timer), noErr);
+            timers.push_back(timer);
         } else if (!timers.empty()) {
-            auto it = timers.begin();
-            std::advance(it, pick(int(timers.size())));
-            QCOMPARE(RemoveEventLoopTimer(*it), noErr);
-            removedTimers.insert(*it);
-            timers.erase(it);
+            QCOMPARE(RemoveEventLoopTimer(takeAny(timers)), noErr);
         }
         QCoreApplication::processEvents();
-        QCOMPARE(lateFirings, 0);
     }
 
-    // Windows come and go, move, grow and redraw; the window list holds exactly the live ones.
+    // Windows come and go, move, grow and redraw.
     void windowStep()
     {
         if (windows.size() < 4 && (windows.empty() || pick(3) == 0)) {
             static const SInt16 kProcIds[] = {0, 1, 2, 3, 4, 5, 8, 16};
-            const Rect bounds{SInt16(60 + pick(200)), SInt16(pick(300)), SInt16(60 + pick(500)),
-                SInt16(pick(600))};
-            const unsigned char title[] = "\x04soak";
-            windows.push_back(NewCWindow(nullptr, &bounds, title, Boolean(pick(4) != 0),
+            const Rect bounds{SInt16(60 + pick(200)), SInt16(pick(300)), SInt16(60 + pick(500)), SInt16(pick(600))};
+            windows.push_back(NewCWindow(nullptr, &bounds, VelmarTest::P("\x04soak"), Boolean(pick(4) != 0),
                 kProcIds[pick(8)], reinterpret_cast<AQtWindow*>(-1), true, nullptr));
             QVERIFY(windows.back());
-        } else if (pick(4) == 0) {
-            const size_t i = size_t(pick(int(windows.size())));
-            DisposeWindow(windows[i]);
-            windows.erase(windows.begin() + long(i));
-        } else {
-            WindowRef w = windows[size_t(pick(int(windows.size())))];
-            switch (pick(5)) {
-            case 0: SelectWindow(w); break;
-            case 1: SizeWindow(w, SInt16(pick(1200) - 100), SInt16(pick(1200) - 100), true); break;
-            case 2: MoveWindow(w, coord(2000), coord(2000), Boolean(pick(2))); break;
-            case 3: {
-                const Rect r = rect();
-                InvalWindowRect(w, &r);
-                EventRecord update;
-                if (GetNextEvent(updateMask, &update)) {
-                    BeginUpdate(update.window);
-                    EndUpdate(update.window);
-                }
-                queuedKeys = queuedCarbon = 0; // a classic wait hands the rest to the handlers
-                break;
-            }
-            default: {
-                SetPortWindowPort(w);
-                const Rect r = rect();
-                PaintRect(&r);
-                SetPort(world);
-                break;
-            }
-            }
+            return;
         }
-        std::set<WindowRef> listed;
-        for (WindowRef w = GetWindowList(); w && listed.size() <= windows.size();
-             w = GetNextWindow(w))
-            QVERIFY2(listed.insert(w).second, "a window listed twice");
-        QCOMPARE(listed, std::set<WindowRef>(windows.begin(), windows.end()));
+        if (pick(4) == 0)
+            return DisposeWindow(takeAny(windows));
+        WindowRef w = any(windows);
+        const Rect r = rect();
+        EventRecord update;
+        switch (pick(5)) {
+        case 0: SelectWindow(w); break;
+        case 1: SizeWindow(w, SInt16(pick(1200) - 100), SInt16(pick(1200) - 100), true); break;
+        case 2: MoveWindow(w, coord(2000), coord(2000), Boolean(pick(2))); break;
+        case 3:
+            InvalWindowRect(w, &r);
+            if (GetNextEvent(updateMask, &update))
+                BeginUpdate(update.window), EndUpdate(update.window);
+            break;
+        default: SetPortWindowPort(w), PaintRect(&r), SetPort(world); break;
+        }
     }
 
     void step()
     {
         ++steps;
-        switch (pick(4)) {
-        case 0: draw(); break;
-        case 1: regionStep(); break;
-        case 2: queueStep(); break;
-        default:
-            switch (pick(3)) {
-            case 0: handlerStep(); break;
-            case 1: timerStep(); break;
-            default: windowStep(); break;
-            }
-            break;
-        }
+        const std::function<void()> kinds[] = {[this] { draw(); }, [this] { regionStep(); },
+            [this] { queueStep(); }, [this] { handlerStep(); }, [this] { timerStep(); },
+            [this] { windowStep(); }};
+        kinds[pick(6)]();
     }
 
     void disposeWindows()
@@ -357,16 +213,12 @@ struct Soak {
     void tearDown()
     {
         disposeWindows();
-        for (const auto& [handle, model] : regions)
-            DisposeRgn(handle);
-        regions.clear();
-        for (const auto& [ref, id] : handlers)
+        for (RgnHandle r : regions)
+            DisposeRgn(r);
+        for (EventHandlerRef ref : handlers)
             RemoveEventHandler(ref);
-        handlers.clear();
         for (EventLoopTimerRef timer : timers)
             RemoveEventLoopTimer(timer);
-        timers.clear();
-        FlushSpecificEventsFromQueue(GetMainEventQueue(), isOurs, nullptr);
         FlushEvents(everyEvent, 0);
     }
 };
@@ -388,7 +240,6 @@ private Q_SLOTS:
         qInfo("soak seed %u for %d s (replay with VELMAR_SOAK_SEED=%u)", seed, seconds, seed);
 
         Soak soak(seed);
-        gSoak = &soak;
         const Rect bounds{0, 0, 128, 128};
         QCOMPARE(NewGWorld(&soak.world, 32, &bounds, nullptr, nullptr, 0), SInt16(noErr));
         SetPort(soak.world);
@@ -415,7 +266,6 @@ private Q_SLOTS:
         const long end = residentKiB();
         SetPort(nullptr);
         DisposeGWorld(soak.world);
-        gSoak = nullptr;
         qInfo(
             "%u steps; resident %ld KiB after warm-up, %ld KiB at the end", soak.steps, warm, end);
         // Every handle is reused, so after warm-up memory may wobble but must not climb.

@@ -142,9 +142,9 @@ private Q_SLOTS:
         const int empty = darkPixels(screenPixels(viewOnScreen)); // the caret at most
         QVERIFY(empty <= 20);
 
-        click(pointOf(host, 0));
+        m_x.click(pointOf(host, 0), 20);
         host.settle();
-        typeText("hello world");
+        m_x.type("hello world");
         host.runUntil([&] { return host.text() == QLatin1String("hello world"); });
         QCOMPARE(host.text(), QStringLiteral("hello world"));
         QCOMPARE(host.te->selStart(), SInt16(11));
@@ -166,29 +166,29 @@ private Q_SLOTS:
         QCOMPARE(host.te->selStart(), SInt16(6));
         QCOMPARE(host.te->selEnd(), SInt16(11));
 
-        command('x');
+        m_x.chord(kControl, 'x');
         host.runUntil([&] { return host.text() == QLatin1String("hello "); });
         QCOMPARE(QGuiApplication::clipboard()->text(), QStringLiteral("world"));
-        click(pointOf(host, 0));
+        m_x.click(pointOf(host, 0), 20);
         host.settle();
-        command('v');
+        m_x.chord(kControl, 'v');
         host.runUntil([&] { return host.text() == QLatin1String("worldhello "); });
         QCOMPARE(host.te->selStart(), SInt16(5));
-        command('z');
+        m_x.chord(kControl, 'z');
         host.runUntil([&] { return host.text() == QLatin1String("hello "); });
         QCOMPARE(host.text(), QStringLiteral("hello "));
 
         // A double click selects the word.
-        click(pointOf(host, 2));
-        click(pointOf(host, 2));
+        m_x.click(pointOf(host, 2), 20);
+        m_x.click(pointOf(host, 2), 20);
         host.settle();
         QCOMPARE(host.te->selStart(), SInt16(0));
         QCOMPARE(host.te->selEnd(), SInt16(5));
 
         // Enough text wraps onto more lines; Backspace takes one character back.
-        click(pointOf(host, 6));
+        m_x.click(pointOf(host, 6), 20);
         host.settle();
-        typeText("the record wraps its lines when they grow long");
+        m_x.type("the record wraps its lines when they grow long");
         host.runUntil([&] { return host.text().endsWith(QLatin1String("long")); });
         QVERIFY(host.te->nLines() >= 2);
         m_x.tap(kBackSpace);
@@ -202,25 +202,6 @@ private:
         const Point p = TEGetPoint(offset, host.te);
         return host.window->mapToGlobal(QPoint(p.h + 1, p.v - 3));
     }
-    void click(const QPoint& global)
-    {
-        m_x.moveTo(global);
-        QTest::qWait(20);
-        m_x.button(1, true);
-        m_x.button(1, false);
-    }
-    void typeText(const char* text)
-    {
-        for (const char* c = text; *c; ++c)
-            m_x.tap(static_cast<unsigned char>(*c));
-    }
-    void command(char key)
-    {
-        m_x.key(kControl, true);
-        m_x.tap(static_cast<unsigned char>(key));
-        m_x.key(kControl, false);
-    }
-
     VelmarTest::XTestInput m_x;
 };
 

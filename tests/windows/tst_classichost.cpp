@@ -152,9 +152,7 @@ private Q_SLOTS:
 
         // Click into A (behind B): FindWindow names it, the host selects it, it activates.
         const QPoint inA = a->mapToGlobal(QPoint(20, 20));
-        m_x.moveTo(inA);
-        m_x.button(1, true);
-        m_x.button(1, false);
+        m_x.click(inA, 0);
         // A window manager may hold the click back while it activates the window: wait for
         // both before typing.
         host.runUntil([&] {
@@ -208,9 +206,7 @@ private Q_SLOTS:
         InstallEventHandler(GetApplicationEventTarget(), applicationHandler, 2, mouse, nullptr, &onApplication);
         const QPoint target = w->mapToGlobal(QPoint(30, 30));
         QTimer::singleShot(50, [&] {
-            m_x.moveTo(target);
-            m_x.button(1, true);
-            m_x.button(1, false);
+            m_x.click(target, 0);
         });
         QTimer::singleShot(5000, [] { QuitApplicationEventLoop(); }); // a safety net only
         RunApplicationEventLoop();

@@ -64,18 +64,15 @@ private Q_SLOTS:
         m_x.button(1, false);
     }
 
+    // What the real path adds to the conversion tst_inputconversion checks row by row:
+    // modifiers, punctuation and the keypad as the X server reports them.
     void keys_data()
     {
         QTest::addColumn<qulonglong>("keysym");
         QTest::addColumn<qulonglong>("modifier");
         QTest::addColumn<QString>("expected");
-        QTest::newRow("a") << 0x61ull << 0ull << "61/00 0";
         QTest::newRow("shift-a") << 0x61ull << qulonglong(kShift) << "41/00 200";
-        QTest::newRow("digit 1") << 0x31ull << 0ull << "31/12 0";
         QTest::newRow("comma") << 0x2cull << 0ull << "2c/2b 0";
-        QTest::newRow("shift-slash") << 0x2full << qulonglong(kShift) << "3f/2c 200";
-        QTest::newRow("F5") << 0xffc2ull << 0ull << "10/60 0";
-        QTest::newRow("left arrow") << 0xff51ull << 0ull << "1c/7b 0";
         QTest::newRow("keypad *") << 0xffaaull << 0ull << "2a/43 0";
         QTest::newRow("command-c") << 0x63ull << qulonglong(kControl) << "43/08 100";
         QTest::newRow("option-return") << 0xff0dull << qulonglong(kAlt) << "0d/24 800";
