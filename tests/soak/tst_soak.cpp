@@ -22,6 +22,9 @@
 #include <QRandomGenerator>
 
 #include <functional>
+#ifdef __GLIBC__
+#include <malloc.h>
+#endif
 #include <vector>
 
 using namespace Velmar;
@@ -32,6 +35,13 @@ constexpr UInt32 kSoakClass = 0x736F616B; // 'soak'
 
 long residentKiB()
 {
+    // What the process holds, not what it has freed: the window system answers (released
+    // buffers, under Wayland a frame or two late) come in first, and the allocator gives
+    // freed pages back.
+    QTest::qWait(200);
+#ifdef __GLIBC__
+    malloc_trim(0);
+#endif
     QFile status(QStringLiteral("/proc/self/status"));
     if (!status.open(QIODevice::ReadOnly))
         return -1;
