@@ -60,6 +60,15 @@ public:
             result << word.toInt();
         return result;
     }
+    // The window's screen origin from the program's "ready x y" line.
+    bool readyOrigin(QPoint* origin)
+    {
+        const QList<int> o = numbers(waitFor(QStringLiteral("ready")));
+        if (o.size() != 2)
+            return false;
+        *origin = QPoint(o[0], o[1]);
+        return true;
+    }
     bool finished(int* code)
     {
         // waitForFinished answers false for a process that has already ended.
@@ -168,9 +177,8 @@ private Q_SLOTS:
     {
         QTemporaryDir folder; // where the program writes its resource file
         Program p(QStringLiteral("textres"), folder.path());
-        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
-        QCOMPARE(o.size(), 2);
-        const QPoint origin(o[0], o[1]);
+        QPoint origin;
+        QVERIFY(p.readyOrigin(&origin));
         // Runs from 'styl' (bold, then red from offset 8), a scrap of two 20-byte runs, and a
         // file written, closed, reopened read-only and read back.
         const QStringList expected = {"teLength=16", "face0=1", "red0=0", "face9=0", "red9=65535",
@@ -270,9 +278,8 @@ private Q_SLOTS:
     void trackingLoopAndModes()
     {
         Program p(QStringLiteral("tracker"));
-        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
-        QCOMPARE(o.size(), 2);
-        const QPoint origin(o[0], o[1]);
+        QPoint origin;
+        QVERIFY(p.readyOrigin(&origin));
         m_x.moveTo(origin + QPoint(300, 250)); // out of the way
         // Patterns paint set bits in ink; srcBic text clears its pixels; patXor inverts.
         checkDarkness(screen(), origin,
@@ -307,9 +314,8 @@ private Q_SLOTS:
         QCOMPARE(p.waitFor(QStringLiteral("row10")), QStringLiteral("row10 ffff 0000 1"));
         QCOMPARE(p.waitFor(QStringLiteral("direct")), QStringLiteral("direct 1 text 1"));
         QCOMPARE(p.waitFor(QStringLiteral("back")), QStringLiteral("back 2048"));
-        const QList<int> o = p.numbers(p.waitFor(QStringLiteral("ready")));
-        QCOMPARE(o.size(), 2);
-        const QPoint origin(o[0], o[1]);
+        QPoint origin;
+        QVERIFY(p.readyOrigin(&origin));
         m_x.moveTo(origin + QPoint(390, 290));
         // The bitmap is black on its left half; each copy shows it through its mode.
         checkDarkness(screen(), origin,
